@@ -1,0 +1,36 @@
+// The module's entry points: the host finds these by name.
+#include "EPS.h"
+#include "HFExport.h"
+
+HF_MODULE_EXPORT void InitializePlugin() {}
+
+HF_MODULE_EXPORT void UninitializePlugin() {}
+
+HF_MODULE_EXPORT void GetPluginInfo(PluginInfo* info)
+{
+    if (!info)
+        return;
+    info->m_llKind = 1;
+    info->m_strVersion = "1.0.0.1";
+    info->m_strIdentifier = "Orv.EPS.1";
+    info->m_strDisplayName = "EPS";
+    info->m_arrExtensions.Add(".eps");
+    info->m_arrRequiredServerFeatures.Add("GA2_HOTFOLDERS");
+}
+
+HF_MODULE_EXPORT HFPlugin* GetPluginInstance(const wchar_t* name)
+{
+    try
+    {
+        return new EPS(wxString(name ? name : L""));
+    }
+    catch (...)
+    {
+        return nullptr;
+    }
+}
+
+HF_MODULE_EXPORT void ReleasePluginInstance(HFPlugin* plugin)
+{
+    delete plugin; // virtual: freed by the module that made it
+}
