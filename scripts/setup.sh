@@ -4,7 +4,7 @@
 set -euo pipefail
 
 packages=(
-  build-essential cmake pkg-config git
+  build-essential cmake pkg-config git ccache
   libwxgtk3.2-dev libgtest-dev libgmock-dev
   gettext ghostscript epstool
   xvfb xauth x11-utils libxml2-utils
