@@ -1,0 +1,24 @@
+#pragma once
+#include <cstddef>
+#include <string>
+
+#include <wx/string.h>
+#include <wx/xml/xml.h>
+
+namespace db
+{
+// Replaces a file so that readers see either the old or the new content,
+// never a part: the bytes go to a temporary file in the same directory,
+// which is flushed to disk and renamed over the target; the directory is
+// synced last. An existing target's permission bits are kept; a new file
+// gets 0666 less the umask.
+class AtomicFile
+{
+public:
+    static bool Write(const wxString& path, const void* data, size_t size);
+    static bool Write(const wxString& path, const std::string& bytes);
+    // Serialises the document ("UTF-8" unless the document says otherwise)
+    // with the given indentation step and writes it as above.
+    static bool WriteXml(const wxString& path, const wxXmlDocument& document, int indent = 2);
+};
+} // namespace db

@@ -1,0 +1,13 @@
+#pragma once
+#include <wx/string.h>
+
+namespace utils
+{
+class TempFolderCreator
+{
+public:
+    // Local time as year, month, day, hour, minute, second, millisecond, each
+    // without padding: unique only to the millisecond, which callers accept.
+    static wxString GetTempFolder();
+};
+} // namespace utils
