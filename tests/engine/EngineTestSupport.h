@@ -2,6 +2,7 @@
 // Helpers shared by the engine tests: scratch folders, fixtures written on
 // the fly, standard-error capture and input fingerprints.
 #include <fcntl.h>
+#include <locale.h>
 #include <ftw.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -136,10 +137,31 @@ inline Fingerprint TakeFingerprint(const std::string& path)
     return print;
 }
 
-// An EPS program that fills exactly its bounding box, with the given box
-// comment text (so tests can write any numbers, or none).
+// Numbers in EPS files use "." whatever locale a test switched to.
+class CNumbers
+{
+public:
+    CNumbers() : m_c(newlocale(LC_ALL_MASK, "C", static_cast<locale_t>(nullptr)))
+    {
+        m_previous = uselocale(m_c);
+    }
+    ~CNumbers()
+    {
+        uselocale(m_previous);
+        freelocale(m_c);
+    }
+    CNumbers(const CNumbers&) = delete;
+    CNumbers& operator=(const CNumbers&) = delete;
+
+private:
+    locale_t m_c;
+    locale_t m_previous;
+};
+
+// An EPS program that fills exactly its bounding box.
 inline std::string FilledBoxEps(double llx, double lly, double urx, double ury)
 {
+    CNumbers cNumbers;
     char text[1024];
     std::snprintf(text, sizeof text,
                   "%%!PS-Adobe-3.0 EPSF-3.0\n"

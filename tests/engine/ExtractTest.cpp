@@ -1,0 +1,170 @@
+// Copying a byte range: chunking, the premature-EOF rule, write failures and
+// the copy buffer's degrade steps.
+#include <string>
+
+#include <gtest/gtest.h>
+
+#include "EngineAlloc.h"
+#include "EngineTestSupport.h"
+
+using namespace hf_test;
+
+namespace
+{
+constexpr size_t kMegabyte = 1048576;
+
+// Distinct bytes at every position, so a misplaced chunk shows.
+std::string Pattern(size_t size)
+{
+    std::string bytes(size, '\0');
+    for (size_t i = 0; i < size; ++i)
+        bytes[i] = static_cast<char>((i * 7 + i / 251) & 0xFF);
+    return bytes;
+}
+
+struct Copy
+{
+    std::string output;
+    std::string messages;
+};
+
+class Extract_ : public ::testing::Test
+{
+protected:
+    Copy Run(const std::string& input, long offset, long length)
+    {
+        const std::string in = scratch.File("in.bin");
+        const std::string out = scratch.File("out.bin");
+        WriteBytes(in, input);
+        FILE* inFile = fopen(in.c_str(), "rb");
+        FILE* outFile = fopen(out.c_str(), "wb");
+        Copy copy;
+        {
+            StderrCapture capture;
+            ExtractEPSfromTIFFpreview(inFile, outFile, offset, length);
+            copy.messages = capture.Text();
+        }
+        fclose(inFile);
+        fclose(outFile);
+        copy.output = ReadBytes(out);
+        return copy;
+    }
+    ScratchDir scratch;
+};
+} // namespace
+
+TEST_F(Extract_, CopiesExactRangeInWholeChunks)
+{
+    const std::string input = Pattern(3000000);
+    const Copy whole = Run(input, 0, 3000000);
+    EXPECT_EQ(whole.messages, "");
+    EXPECT_TRUE(whole.output == input);
+
+    const Copy middle = Run(input, 1234, 2 * kMegabyte + 10);
+    EXPECT_EQ(middle.messages, "");
+    EXPECT_TRUE(middle.output == input.substr(1234, 2 * kMegabyte + 10));
+
+    EXPECT_EQ(Run(input, 0, 0).output.size(), 0u);
+    EXPECT_EQ(Run(input, 0, 0).messages, "");
+}
+
+TEST_F(Extract_, ShortFileDropsTheLastPartialChunkAndReportsWhatIsMissing)
+{
+    // 3 000 000 asked, 500 missing: chunks of 1048576, 1048576, then a short
+    // read of 902348 that is not written.
+    const std::string input = Pattern(3000000 - 500);
+    const Copy copy = Run(input, 0, 3000000);
+    EXPECT_EQ(copy.messages, "Premature EOF with leftover BytesToRead = 500\n");
+    EXPECT_EQ(copy.output.size(), 2 * kMegabyte);
+    EXPECT_TRUE(copy.output == input.substr(0, 2 * kMegabyte));
+
+    // Past the end: nothing copied, the whole count left over.
+    const Copy past = Run(Pattern(100), 5000, 777);
+    EXPECT_EQ(past.messages, "Premature EOF with leftover BytesToRead = 777\n");
+    EXPECT_EQ(past.output.size(), 0u);
+
+    // The count is unsigned: the DOS header's largest length.
+    const Copy huge = Run(Pattern(100), 0, 0xFFFFFFFFL);
+    EXPECT_EQ(huge.messages, "Premature EOF with leftover BytesToRead = 4294967195\n");
+    EXPECT_EQ(huge.output.size(), 0u);
+}
+
+TEST_F(Extract_, NegativeOffsetFailsTheSeek)
+{
+    const Copy copy = Run(Pattern(100), -5, 10);
+    EXPECT_EQ(copy.messages, "Error from fseek in ExtractEPSfromTIFFpreview\n");
+    EXPECT_EQ(copy.output.size(), 0u);
+}
+
+TEST_F(Extract_, WriteFailureIsReported)
+{
+    const std::string in = scratch.File("in.bin");
+    WriteBytes(in, Pattern(2 * kMegabyte));
+    FILE* inFile = fopen(in.c_str(), "rb");
+    FILE* full = fopen("/dev/full", "wb");
+    ASSERT_NE(full, nullptr);
+    StderrCapture capture;
+    ExtractEPSfromTIFFpreview(inFile, full, 0, 2 * kMegabyte);
+    const std::string messages = capture.Text();
+    fclose(inFile);
+    fclose(full);
+    EXPECT_EQ(messages, "Error from fwrite in ExtractEPSfromTIFFpreview\n");
+}
+
+TEST_F(Extract_, ReadErrorIsReported)
+{
+    // A write-only stream cannot be read from: fread sets the error flag.
+    const std::string in = scratch.File("wo.bin");
+    WriteBytes(in, Pattern(1000));
+    FILE* inFile = fopen(in.c_str(), "ab");
+    FILE* outFile = fopen(scratch.File("out.bin").c_str(), "wb");
+    StderrCapture capture;
+    ExtractEPSfromTIFFpreview(inFile, outFile, 0, 100);
+    const std::string messages = capture.Text();
+    fclose(inFile);
+    fclose(outFile);
+    EXPECT_EQ(messages, "Error from fread in ExtractEPSfromTIFFpreview\n");
+}
+
+TEST_F(Extract_, BufferDegradesAndChunkSizeFollows)
+{
+    // A file 10 bytes short of what is asked: the output ends with the last
+    // whole chunk, so its length shows the buffer size in use.
+    const std::string input = Pattern(100000);
+    const struct
+    {
+        int failures;
+        size_t outputSize;
+        const char* messages;
+    } steps[] = {
+        {0, 0, ""},
+        {1, 65536, "1MB not available from malloc; trying smaller amount\n"},
+        {2, 98304,
+         "1MB not available from malloc; trying smaller amount\n"
+         "64KB not available from malloc; trying smaller amount\n"},
+        {3, 99840,
+         "1MB not available from malloc; trying smaller amount\n"
+         "64KB not available from malloc; trying smaller amount\n"
+         "4KB not available from malloc; trying smaller amount\n"},
+    };
+    for (const auto& step : steps)
+    {
+        SetEngineAllocFailuresForTesting(0, step.failures);
+        const Copy copy = Run(input, 0, 100010);
+        SetEngineAllocFailuresForTesting(0, 0);
+        EXPECT_EQ(copy.output.size(), step.outputSize) << step.failures;
+        EXPECT_TRUE(copy.output == input.substr(0, step.outputSize));
+        EXPECT_EQ(copy.messages,
+                  std::string(step.messages) + "Premature EOF with leftover BytesToRead = 10\n");
+    }
+
+    SetEngineAllocFailuresForTesting(0, 4);
+    const Copy none = Run(input, 0, 100000);
+    SetEngineAllocFailuresForTesting(0, 0);
+    EXPECT_EQ(none.output.size(), 0u);
+    EXPECT_EQ(none.messages, "1MB not available from malloc; trying smaller amount\n"
+                             "64KB not available from malloc; trying smaller amount\n"
+                             "4KB not available from malloc; trying smaller amount\n"
+                             "Even 256 bytes not available for copy buffer in "
+                             "ExtractEPSfromTIFFpreview\n");
+}
