@@ -1,0 +1,142 @@
+#include "db/AtomicFile.h"
+
+#include <cerrno>
+#include <climits>
+#include <cstdlib>
+#include <ctime>
+#include <string>
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <wx/mstream.h>
+
+namespace
+{
+bool WriteAll(int fd, const char* data, size_t size)
+{
+    while (size > 0)
+    {
+        const ssize_t written = ::write(fd, data, size);
+        if (written < 0)
+        {
+            if (errno == EINTR)
+                continue;
+            return false;
+        }
+        data += written;
+        size -= static_cast<size_t>(written);
+    }
+    return true;
+}
+
+// A symbolic link is followed, so the file it names is replaced rather than
+// the link itself.
+std::string ResolveTarget(const std::string& path)
+{
+    struct stat info;
+    if (::lstat(path.c_str(), &info) == 0 && S_ISLNK(info.st_mode))
+    {
+        char resolved[PATH_MAX];
+        if (::realpath(path.c_str(), resolved))
+            return resolved;
+    }
+    return path;
+}
+
+std::string DirectoryOf(const std::string& path)
+{
+    const size_t slash = path.rfind('/');
+    if (slash == std::string::npos)
+        return ".";
+    if (slash == 0)
+        return "/";
+    return path.substr(0, slash);
+}
+
+// O_EXCL with a fresh random suffix: the temp file is ours alone, and its
+// mode is 0666 less the umask like any newly created file.
+int CreateTempBeside(const std::string& target, std::string& tempPath)
+{
+    const std::string directory = DirectoryOf(target);
+    const size_t slash = target.rfind('/');
+    const std::string base = slash == std::string::npos ? target : target.substr(slash + 1);
+    static thread_local unsigned seed =
+        static_cast<unsigned>(::getpid()) ^ static_cast<unsigned>(::time(nullptr));
+    for (int attempt = 0; attempt < 100; ++attempt)
+    {
+        char suffix[16];
+        snprintf(suffix, sizeof suffix, ".%08x", static_cast<unsigned>(rand_r(&seed)));
+        tempPath = directory + "/." + base + suffix + ".tmp";
+        const int fd = ::open(tempPath.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
+        if (fd >= 0 || errno != EEXIST)
+            return fd;
+    }
+    return -1;
+}
+
+void SyncDirectory(const std::string& directory)
+{
+    const int fd = ::open(directory.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    if (fd < 0)
+        return;
+    ::fsync(fd);
+    ::close(fd);
+}
+} // namespace
+
+namespace db
+{
+bool AtomicFile::Write(const wxString& path, const void* data, size_t size)
+{
+    if (path.empty())
+        return false;
+    const std::string target = ResolveTarget(std::string(path.fn_str()));
+    std::string tempPath;
+    const int fd = CreateTempBeside(target, tempPath);
+    if (fd < 0)
+        return false;
+
+    // The replacement keeps the permissions (and, for root, the owner) of
+    // the file it replaces: the file is shared by every user of the folder.
+    struct stat old;
+    if (::stat(target.c_str(), &old) == 0 && S_ISREG(old.st_mode))
+    {
+        ::fchmod(fd, old.st_mode & 07777);
+        if (::geteuid() == 0)
+            (void)!::fchown(fd, old.st_uid, old.st_gid);
+    }
+
+    bool ok = WriteAll(fd, static_cast<const char*>(data), size) && ::fsync(fd) == 0;
+    ok = ::close(fd) == 0 && ok;
+    if (ok)
+        ok = ::rename(tempPath.c_str(), target.c_str()) == 0;
+    if (!ok)
+    {
+        ::unlink(tempPath.c_str());
+        return false;
+    }
+    SyncDirectory(DirectoryOf(target));
+    return true;
+}
+
+bool AtomicFile::Write(const wxString& path, const std::string& bytes)
+{
+    return Write(path, bytes.data(), bytes.size());
+}
+
+bool AtomicFile::WriteXml(const wxString& path, const wxXmlDocument& document, int indent)
+{
+    if (!document.IsOk())
+        return false;
+    wxMemoryOutputStream stream;
+    if (!document.Save(stream, indent))
+        return false;
+    const size_t length = static_cast<size_t>(stream.GetLength());
+    std::string bytes(length, '\0');
+    if (length > 0)
+        stream.CopyTo(&bytes[0], length);
+    return Write(path, bytes);
+}
+} // namespace db
