@@ -1,0 +1,156 @@
+// Real EPS artwork from installed packages, plain and wrapped by epstool in a
+// DOS EPS binary with a TIFF preview: it must convert and render cleanly, and
+// the wrapped file must give the same page as the plain one.
+#include <glob.h>
+
+#include <string>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+#include "EngineTestSupport.h"
+#include "GhostscriptOracle.h"
+
+using namespace hf_test;
+
+namespace
+{
+// EPS files that Debian packages install: Ghostscript's examples where the
+// package ships them, and the artwork that comes with Tk.
+std::vector<std::string> InstalledArtwork()
+{
+    std::vector<std::string> found;
+    for (const char* pattern :
+         {"/usr/share/ghostscript/*/examples/*.eps", "/usr/share/doc/ghostscript*/examples/*.eps",
+          "/usr/share/tcltk/tk*/images/*.eps"})
+    {
+        glob_t matches;
+        if (glob(pattern, 0, nullptr, &matches) == 0)
+            for (size_t i = 0; i < matches.gl_pathc; ++i)
+                found.push_back(matches.gl_pathv[i]);
+        globfree(&matches);
+    }
+    return found;
+}
+
+EPStoPSparams_t A4Centred()
+{
+    EPStoPSparams_t p = NoParams();
+    p.pageWidth = 595;
+    p.pageHeight = 842;
+    p.imageableLLX = p.imageableLLY = 18;
+    p.imageableURX = 577;
+    p.imageableURY = 824;
+    p.imagePosition = IMG_POS_CENTER;
+    p.customSize = p.autoScale = p.fitToPage = true;
+    static char setPageDevice[] = "<< /PageSize [595 842] >> setpagedevice";
+    p.setPageDeviceString = setPageDevice;
+    return p;
+}
+
+std::string BaseName(const std::string& path)
+{
+    return path.substr(path.rfind('/') + 1);
+}
+} // namespace
+
+TEST(RealArtwork, ConvertsAndRendersWithoutError)
+{
+    if (!ProgramAvailable("gs"))
+        GTEST_SKIP() << "Ghostscript (gs) not installed";
+    const std::vector<std::string> artwork = InstalledArtwork();
+    if (artwork.empty())
+        GTEST_SKIP() << "no EPS artwork installed (ghostscript examples or Tk images)";
+    ScratchDir scratch;
+    for (const std::string& eps : artwork)
+    {
+        SCOPED_TRACE(eps);
+        const Fingerprint before = TakeFingerprint(eps);
+        const std::string original = scratch.File(BaseName(eps) + ".orig.ps");
+        const std::string onA4 = scratch.File(BaseName(eps) + ".a4.ps");
+        ASSERT_EQ(DetectAndConvert(eps, NoParams(), original), 1);
+        ASSERT_EQ(DetectAndConvert(eps, A4Centred(), onA4), 1);
+        EXPECT_TRUE(TakeFingerprint(eps) == before);
+
+        // Original size: the page is the picture, the marks lie on it.
+        const GhostscriptReport own = RunGhostscriptBBox(original);
+        EXPECT_FALSE(own.postscriptError) << own.process.err;
+        EXPECT_EQ(own.pages, 1);
+        EXPECT_TRUE(own.marked);
+        EXPECT_GT(own.marks.urx - own.marks.llx, 1);
+
+        // Fitted to the A4 area: the marks fill it in one direction at least.
+        const GhostscriptReport a4 = RunGhostscriptBBox(onA4);
+        EXPECT_FALSE(a4.postscriptError) << a4.process.err;
+        EXPECT_EQ(a4.pages, 1);
+        EXPECT_NEAR(a4.pageWidth, 595, 0.5);
+        EXPECT_NEAR(a4.pageHeight, 842, 0.5);
+        EXPECT_GE(a4.marks.llx, 17);
+        EXPECT_GE(a4.marks.lly, 17);
+        EXPECT_LE(a4.marks.urx, 578);
+        EXPECT_LE(a4.marks.ury, 825);
+        EXPECT_GT(std::max(a4.marks.urx - a4.marks.llx, a4.marks.ury - a4.marks.lly), 500);
+    }
+}
+
+TEST(RealArtwork, DosBinaryFromEpstoolGivesThePostScriptSectionOnly)
+{
+    if (!ProgramAvailable("gs") || !ProgramAvailable("epstool"))
+        GTEST_SKIP() << "needs Ghostscript (gs) and epstool";
+    const std::vector<std::string> artwork = InstalledArtwork();
+    if (artwork.empty())
+        GTEST_SKIP() << "no EPS artwork installed (ghostscript examples or Tk images)";
+    ScratchDir scratch;
+    for (const std::string& eps : artwork)
+    {
+        SCOPED_TRACE(eps);
+        const std::string wrapped = scratch.File(BaseName(eps) + ".dos.eps");
+        const ProcessResult made =
+            RunProgram({"epstool", "--add-tiff-preview", "--device", "tiffg3", eps, wrapped});
+        ASSERT_EQ(made.exitCode, 0) << made.err;
+        const std::string dosBytes = ReadBytes(wrapped);
+        ASSERT_GE(dosBytes.size(), 30u);
+        ASSERT_EQ(dosBytes.compare(0, 4, "\xC5\xD0\xD3\xC6"), 0) << "epstool made no DOS EPS";
+
+        void* context = nullptr;
+        ASSERT_EQ(IsThisEPS(wrapped.c_str(), &context), 1u);
+        const EPSinfo_t info = *static_cast<EPSinfo_t*>(context);
+        const std::string section =
+            dosBytes.substr(static_cast<size_t>(info.psOffset), static_cast<size_t>(info.psLength));
+        const std::string fromDos = scratch.File("dos.ps");
+        const EPStoPSparams_t a4 = A4Centred();
+        ASSERT_EQ(ConvertEPStoPS(&context, &a4, fromDos.c_str()), 1);
+
+        // Exactly the PostScript section between the wrapper's parts.
+        const std::string out = ReadBytes(fromDos);
+        const size_t begin = out.find("%%BeginDocument:");
+        ASSERT_NE(begin, std::string::npos);
+        const size_t body = out.find("\r\n", begin) + 2;
+        EXPECT_EQ(out.compare(body, section.size(), section), 0);
+        EXPECT_EQ(out.compare(body + section.size(), 15, "%%EndDocument\r\n"), 0);
+        EXPECT_EQ(out.find("II*"), std::string::npos) << "TIFF preview bytes in the output";
+        EXPECT_EQ(out.find("\xC5\xD0\xD3\xC6"), std::string::npos);
+
+        // epstool rewrites the header comments (it rounds the high-resolution
+        // box), so the same page comes from its section saved as a plain file.
+        const std::string sectionFile = scratch.File("section.eps");
+        WriteBytes(sectionFile, section);
+        const std::string fromSection = scratch.File("section.ps");
+        ASSERT_EQ(DetectAndConvert(sectionFile, A4Centred(), fromSection), 1);
+        const std::string sectionRaster = RenderToPgm(fromSection, 36);
+        ASSERT_FALSE(sectionRaster.empty());
+        EXPECT_TRUE(sectionRaster == RenderToPgm(fromDos, 36))
+            << "the wrapped file renders differently";
+
+        // And the marks match those of the original plain file.
+        const std::string fromPlain = scratch.File("plain.ps");
+        ASSERT_EQ(DetectAndConvert(eps, A4Centred(), fromPlain), 1);
+        const GhostscriptReport plain = RunGhostscriptBBox(fromPlain);
+        const GhostscriptReport dos = RunGhostscriptBBox(fromDos);
+        EXPECT_FALSE(dos.postscriptError) << dos.process.err;
+        EXPECT_NEAR(dos.marks.llx, plain.marks.llx, 0.5);
+        EXPECT_NEAR(dos.marks.lly, plain.marks.lly, 0.5);
+        EXPECT_NEAR(dos.marks.urx, plain.marks.urx, 0.5);
+        EXPECT_NEAR(dos.marks.ury, plain.marks.ury, 0.5);
+    }
+}
