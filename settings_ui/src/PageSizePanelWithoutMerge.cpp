@@ -1,0 +1,181 @@
+#include "PageSizePanelWithoutMerge.h"
+
+#include <wx/combobox.h>
+#include <wx/valgen.h>
+
+#include "ControlIds.h"
+#include "CustomPageSizeDlg.h"
+#include "PageSizeKeys.h"
+#include "UiText.h"
+#include "utils/CLocaleNumbers.h"
+
+PageSizePanelWithoutMerge::PageSizePanelWithoutMerge(wxWindow* parent, bool enabled,
+                                                     bool secondFlag)
+    : OutputFileTypePanelWithoutMerge(parent, enabled, secondFlag), m_bPageSectionEnabled(enabled),
+      m_bPageSecondFlag(secondFlag), m_strPageSize("Default Size"),
+      m_strImagePosition(TranslateUiText("Center")), m_eMeasurementUnit(UNIT_INCH)
+{
+    m_arrPageSizeNames.Add("Default Size");
+    Bind(wxEVT_BUTTON, &PageSizePanelWithoutMerge::OnCustomPageSize, this,
+         ID_CUSTOMPAGESIZE_BUTTON);
+    Bind(wxEVT_COMBOBOX, &PageSizePanelWithoutMerge::OnComboCustomPageSize, this,
+         ID_PAGESIZE_COMBO);
+    Bind(wxEVT_COMBOBOX, &PageSizePanelWithoutMerge::OnComboImagePosition, this,
+         ID_IMAGEPOSITION_COMBO);
+}
+
+bool PageSizePanelWithoutMerge::InitializeControls()
+{
+    if (!m_bPageSectionEnabled)
+        return true;
+    OutputFileTypePanelWithoutMerge::InitializeControls();
+    auto* paper = wxDynamicCast(FindWindow(ID_PAGESIZE_COMBO), wxComboBox);
+    if (paper)
+    {
+        if (!m_arrPageSizeNames.empty())
+            paper->Append(m_arrPageSizeNames);
+        paper->SetValidator(wxGenericValidator(&m_strPageSize));
+    }
+    if (wxWindow* position = FindWindow(ID_IMAGEPOSITION_COMBO))
+        position->SetValidator(wxGenericValidator(&m_strImagePosition));
+    return true;
+}
+
+void PageSizePanelWithoutMerge::AddCustomPageSize()
+{
+    auto* paper = wxDynamicCast(FindWindow(ID_PAGESIZE_COMBO), wxComboBox);
+    if (!paper)
+        return;
+    paper->Append(CustomPageEntryText(m_dCustomWidth, m_dCustomHeight, m_eMeasurementUnit));
+    paper->SetSelection(paper->GetCount() - 1);
+}
+
+void PageSizePanelWithoutMerge::OnCustomPageSize(wxCommandEvent&)
+{
+    const Unit_t unit = m_eMeasurementUnit;
+    double minWidth = m_customPage.MinMediaWidth, maxWidth = m_customPage.MaxMediaWidth;
+    double minHeight = m_customPage.MinMediaHeight, maxHeight = m_customPage.MaxMediaHeight;
+    for (double* value :
+         {&minWidth, &maxWidth, &minHeight, &maxHeight, &m_dCustomWidth, &m_dCustomHeight})
+        convertToUnit(*value, UNIT_POINT, unit);
+
+    CustomPageSizeDlg dialog(this, wxID_ANY, TranslateUiText("Custom page size"), minWidth,
+                             maxWidth, minHeight, maxHeight, m_dCustomWidth, m_dCustomHeight, unit,
+                             m_customPage.SubstrateHeightToLength);
+    dialog.Centre(wxBOTH);
+    if (dialog.ShowModal() == wxID_OK)
+    {
+        m_bCustomPageSize = true;
+        Unit_t dialogUnit = unit;
+        dialog.GetPageSizes(m_dCustomWidth, m_dCustomHeight, dialogUnit);
+        convertToUnit(m_dCustomWidth, dialogUnit, unit);
+        convertToUnit(m_dCustomHeight, dialogUnit, unit);
+        AddCustomPageSize();
+    }
+    convertToUnit(m_dCustomWidth, unit, UNIT_POINT);
+    convertToUnit(m_dCustomHeight, unit, UNIT_POINT);
+}
+
+void PageSizePanelWithoutMerge::OnRadioPortrait(wxCommandEvent& event)
+{
+    m_bPortrait = event.IsChecked();
+    m_bLandscape = !m_bPortrait;
+}
+
+void PageSizePanelWithoutMerge::OnRadioLandscape(wxCommandEvent& event)
+{
+    m_bLandscape = event.IsChecked();
+    m_bPortrait = !m_bLandscape;
+}
+
+void PageSizePanelWithoutMerge::OnCheckAutoRotate(wxCommandEvent& event)
+{
+    m_bAutoRotate = event.IsChecked();
+}
+
+bool PageSizePanelWithoutMerge::SaveUISettings(MapPropToValue& settings)
+{
+    if (!m_bPageSectionEnabled)
+        return true;
+    if (auto* paper = wxDynamicCast(FindWindow(ID_PAGESIZE_COMBO), wxComboBox))
+    {
+        if (!m_arrPageSizeNames.empty() &&
+            m_arrPageSizeNames.Index(paper->GetValue()) != wxNOT_FOUND)
+        {
+            m_bCustomPageSize = false;
+            settings["CUSTOMPAGESIZE"] = "0";
+        }
+    }
+    OutputFileTypePanelWithoutMerge::SaveUISettings(settings);
+
+    const stPageAttribute* sheet = FindSheetByDisplayName(m_sheets, m_strPageSize);
+    settings["DEFAULTPAGESIZE"] = sheet ? sheet->PaperName : m_strPageSize;
+    settings["ORIENTATIONPOTRAIT"] = wxString::Format("%d", m_bPortrait);
+    settings["ORIENTATIONLANDSCAPE"] = wxString::Format("%d", m_bLandscape);
+    settings["AUTOROTATE"] = wxString::Format("%d", m_bAutoRotate);
+    settings["IMAGEPOSITION"] = m_strImagePosition;
+    if (sheet)
+        WriteSheetPageKeys(settings, *sheet);
+    if (m_bCustomPageSize)
+        WriteCustomPageKeys(settings, m_dCustomWidth, m_dCustomHeight, m_customPage,
+                            m_eMeasurementUnit);
+    return true;
+}
+
+bool PageSizePanelWithoutMerge::LoadUISettings(MapPropToValue& settings)
+{
+    if (!m_bPageSectionEnabled)
+        return true;
+    const wxString portrait = settings["ORIENTATIONPOTRAIT"];
+    m_bPortrait = portrait.empty() || portrait == "1";
+    m_bLandscape = settings["ORIENTATIONLANDSCAPE"] == "1";
+    m_bAutoRotate = settings["AUTOROTATE"] == "1";
+
+    const wxString paperKey = settings["DEFAULTPAGESIZE"];
+    if (paperKey.empty())
+    {
+        if (!m_arrPageSizeNames.empty())
+            m_strPageSize = m_arrPageSizeNames[0];
+    }
+    else
+    {
+        const stPageAttribute* sheet = FindSheetByPaperName(m_sheets, paperKey);
+        m_strPageSize = sheet ? sheet->PaperDisplayName : paperKey;
+    }
+
+    const wxString position = settings["IMAGEPOSITION"];
+    m_strImagePosition = position.empty() ? TranslateUiText("Center") : position;
+
+    const wxString width = settings["CUSTOMPAGEWIDTH"];
+    if (!width.empty())
+        m_dCustomWidth = utils::StrToDoubleC(width);
+    else if (!m_sheets.empty())
+        m_dCustomWidth = m_sheets.front().Width;
+    const wxString height = settings["CUSTOMPAGEHEIGHT"];
+    if (!height.empty())
+        m_dCustomHeight = utils::StrToDoubleC(height);
+    else if (!m_sheets.empty())
+        m_dCustomHeight = m_sheets.front().Height;
+
+    const wxString unit = settings["CUSTOMPAGETUNIT"];
+    if (unit.empty() || unit == "0")
+        m_eMeasurementUnit = UNIT_INCH;
+    else if (unit == "1")
+        m_eMeasurementUnit = UNIT_MM;
+    else if (unit == "2")
+        m_eMeasurementUnit = UNIT_POINT;
+
+    m_bCustomPageSize = settings["CUSTOMPAGESIZE"] == "1";
+    if (m_bCustomPageSize)
+    {
+        convertToUnit(m_dCustomWidth, UNIT_POINT, m_eMeasurementUnit);
+        convertToUnit(m_dCustomHeight, UNIT_POINT, m_eMeasurementUnit);
+        AddCustomPageSize();
+        // The list now shows the custom entry; the bound text must follow it.
+        m_strPageSize = CustomPageEntryText(m_dCustomWidth, m_dCustomHeight, m_eMeasurementUnit);
+        convertToUnit(m_dCustomWidth, m_eMeasurementUnit, UNIT_POINT);
+        convertToUnit(m_dCustomHeight, m_eMeasurementUnit, UNIT_POINT);
+    }
+    TransferDataToWindow();
+    return OutputFileTypePanelWithoutMerge::LoadUISettings(settings);
+}
