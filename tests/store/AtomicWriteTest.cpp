@@ -1,0 +1,137 @@
+// A configuration file is replaced whole or not at all, even when the
+// writing process is killed at an arbitrary moment.
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <chrono>
+#include <random>
+
+#include <signal.h>
+#include <sys/stat.h>
+#include <sys/wait.h>
+#include <time.h>
+#include <unistd.h>
+
+#include <wx/log.h>
+
+#include "FolderFixtures.h"
+#include "StoreTestSupport.h"
+#include "db/AtomicFile.h"
+
+using namespace storetest;
+
+namespace
+{
+// Large enough that one write takes a good number of system calls.
+FolderConfig LargeConfig(const char* variant)
+{
+    FolderConfig config = FullFolderConfig();
+    config.setting.SetDescription(variant);
+    for (int i = 0; i < 2000; ++i)
+    {
+        const wxString key = wxString::Format("Key%05d", i);
+        const wxString value = wxString::Format("%s value %d with some padding text", variant, i);
+        config.job.SaveProperty(key, value, value, value);
+    }
+    return config;
+}
+
+void SleepMicroseconds(long microseconds)
+{
+    timespec pause{microseconds / 1000000, (microseconds % 1000000) * 1000};
+    while (nanosleep(&pause, &pause) != 0)
+    {
+    }
+}
+} // namespace
+
+TEST(AtomicWrite, KilledWriterLeavesOneWholeVersion)
+{
+    TempDir dir;
+    const FolderConfig versionA = LargeConfig("A");
+    const FolderConfig versionB = LargeConfig("B");
+    ASSERT_EQ(versionA.Write(dir.wx("a.cfg")), 0);
+    ASSERT_EQ(versionB.Write(dir.wx("b.cfg")), 0);
+    const std::string bytesA = ReadFile(dir / "a.cfg");
+    const std::string bytesB = ReadFile(dir / "b.cfg");
+    ASSERT_NE(bytesA, bytesB);
+    ASSERT_GT(bytesA.size(), 300000u);
+    const wxString target = dir.wx("Folder.cfg");
+    const auto started = std::chrono::steady_clock::now();
+    ASSERT_EQ(versionA.Write(target), 0);
+    // Kill moments range from microseconds to a few whole writes.
+    const long writeMicroseconds =
+        std::max<long>(1000, std::chrono::duration_cast<std::chrono::microseconds>(
+                                 std::chrono::steady_clock::now() - started)
+                                 .count());
+    RecordProperty("writeMicroseconds", static_cast<int>(writeMicroseconds));
+
+    std::mt19937 random(12345);
+    std::uniform_int_distribution<int> scale(0, 3);
+    int sawA = 0, sawB = 0;
+    const int kills = 80;
+    for (int round = 0; round < kills; ++round)
+    {
+        const pid_t writer = fork();
+        ASSERT_NE(writer, -1);
+        if (writer == 0)
+        {
+            for (unsigned i = 0;; ++i)
+                (i % 2 ? versionA : versionB).Write(target);
+        }
+        const long maxDelay[] = {50, writeMicroseconds / 4, writeMicroseconds,
+                                 4 * writeMicroseconds};
+        SleepMicroseconds(std::uniform_int_distribution<long>(1, maxDelay[scale(random)])(random));
+        ASSERT_EQ(kill(writer, SIGKILL), 0);
+        int status = 0;
+        ASSERT_EQ(waitpid(writer, &status, 0), writer);
+        ASSERT_TRUE(WIFSIGNALED(status));
+
+        const std::string now = ReadFile(dir / "Folder.cfg");
+        const bool isA = now == bytesA, isB = now == bytesB;
+        ASSERT_TRUE(isA || isB) << "round " << round << ": " << now.size() << " bytes";
+        sawA += isA;
+        sawB += isB;
+        db::Setting setting;
+        ASSERT_EQ(db::HFDatabase::ReadSetting(target, setting), 1);
+    }
+    RecordProperty("versionA", sawA);
+    RecordProperty("versionB", sawB);
+    EXPECT_GT(sawB, 0) << "the writer never finished a write: the test proved nothing";
+}
+
+TEST(AtomicWrite, ReplacementKeepsThePermissionsOfTheOldFile)
+{
+    TempDir dir;
+    const std::string path = dir / "Folder.cfg";
+    WriteFile(path, "old");
+    ASSERT_EQ(chmod(path.c_str(), 0664), 0);
+    ASSERT_TRUE(db::AtomicFile::Write(wxString::FromUTF8(path), std::string("new")));
+    struct stat info;
+    ASSERT_EQ(stat(path.c_str(), &info), 0);
+    EXPECT_EQ(info.st_mode & 07777, 0664u);
+    EXPECT_EQ(ReadFile(path), "new");
+}
+
+TEST(AtomicWrite, SymbolicLinkTargetIsReplacedNotTheLink)
+{
+    TempDir dir;
+    WriteFile(dir / "real.cfg", "old");
+    ASSERT_EQ(symlink((dir / "real.cfg").c_str(), (dir / "link.cfg").c_str()), 0);
+    ASSERT_TRUE(db::AtomicFile::Write(dir.wx("link.cfg"), std::string("new")));
+    struct stat info;
+    ASSERT_EQ(lstat((dir / "link.cfg").c_str(), &info), 0);
+    EXPECT_TRUE(S_ISLNK(info.st_mode));
+    EXPECT_EQ(ReadFile(dir / "real.cfg"), "new");
+}
+
+TEST(AtomicWrite, FailedWriteLeavesNoTemporaryFileBehind)
+{
+    TempDir dir;
+    ASSERT_EQ(mkdir((dir / "Folder.cfg").c_str(), 0755), 0);
+    EXPECT_FALSE(db::AtomicFile::Write(dir.wx("Folder.cfg"), std::string("x")));
+    std::string listing;
+    ASSERT_EQ(storetest::Run({"ls", "-A", dir.path()}, &listing), 0);
+    EXPECT_EQ(listing, "Folder.cfg\n");
+    EXPECT_FALSE(db::AtomicFile::Write(dir.wx("missing-dir/Folder.cfg"), std::string("x")));
+}
