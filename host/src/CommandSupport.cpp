@@ -1,0 +1,36 @@
+#include <cstdio>
+
+#include "CommandLine.h"
+#include "Commands.h"
+#include "ConsoleText.h"
+
+bool ParseCommandLine(const Arguments& args, std::vector<OptionSpec> specs, const char* usage,
+                      size_t minPositionals, size_t maxPositionals, ParsedArgs& parsed,
+                      int& exitStatus)
+{
+    specs.push_back({"--help", false, false, "-h"});
+    specs.push_back({"--module", true, false, ""});
+    std::string error;
+    if (!ParseArgs(args, specs, parsed, error))
+    {
+        PrintError(FromUtf8(error));
+        std::fputs(usage, stderr);
+        exitStatus = kExitUsage;
+        return false;
+    }
+    if (parsed.Has("--help"))
+    {
+        std::fputs(usage, stdout);
+        exitStatus = kExitSuccess;
+        return false;
+    }
+    if (parsed.positionals.size() < minPositionals || parsed.positionals.size() > maxPositionals)
+    {
+        PrintError(parsed.positionals.size() < minPositionals ? "missing argument"
+                                                              : "too many arguments");
+        std::fputs(usage, stderr);
+        exitStatus = kExitUsage;
+        return false;
+    }
+    return true;
+}

@@ -1,0 +1,7 @@
+#pragma once
+#include <wx/string.h>
+
+// Where the filter module is: the explicit path, else $HOTFOLDER_MODULE, else
+// ../lib/hotfolder/filters/EPS.so relative to this executable (the same
+// relation holds in the build tree and after installation).
+wxString LocateFilterModule(const wxString& explicitPath);
