@@ -119,6 +119,9 @@ int RunInitCommand(const Arguments& args)
         PrintError("cannot write the folder configuration " + configFile);
         return kExitSetupFailed;
     }
+    // The list's writer makes only the last level of the warehouse.
+    wxString ignored;
+    MakeDirectories(db::PathResolver::GetWarehousePath(), ignored);
     if (!IsListed(folder) && !db::HFDatabase::AddToHotfolderList(folder))
         PrintError("warning: cannot add " + folder + " to the machine-wide hot-folder list in " +
                    db::PathResolver::GetWarehousePath());
