@@ -29,13 +29,25 @@ EPS::EPS(wxString) : m_settings(100)
     m_params.setPageDeviceString = nullptr;
 }
 
-EPS::~EPS() { delete[] m_params.setPageDeviceString; }
+EPS::~EPS()
+{
+    delete[] m_params.setPageDeviceString;
+}
 
-void EPS::GetVersion(wxString& out) { out = kVersion; }
+void EPS::GetVersion(wxString& out)
+{
+    out = kVersion;
+}
 
-void EPS::GetDisplayName(wxString& out) { out = kDisplayName; }
+void EPS::GetDisplayName(wxString& out)
+{
+    out = kDisplayName;
+}
 
-void EPS::GetShortName(wxString& out) { out = kIdentifier; }
+void EPS::GetShortName(wxString& out)
+{
+    out = kIdentifier;
+}
 
 void EPS::GetSupportedFileExtensions(wxArrayString& extensions, wxArrayString& second)
 {
@@ -43,7 +55,10 @@ void EPS::GetSupportedFileExtensions(wxArrayString& extensions, wxArrayString& s
     extensions.Insert("eps", 0);
 }
 
-int EPS::GetGroupType() { return 1; }
+int EPS::GetGroupType()
+{
+    return 1;
+}
 
 bool EPS::GetErrorString(long code, wxString& out)
 {
@@ -51,9 +66,15 @@ bool EPS::GetErrorString(long code, wxString& out)
     return true;
 }
 
-bool EPS::IsInitialized() { return true; }
+bool EPS::IsInitialized()
+{
+    return true;
+}
 
-long EPS::DeInitialize() { return 0; }
+long EPS::DeInitialize()
+{
+    return 0;
+}
 
 void EPS::GetServerKeys(wxArrayString& keys)
 {

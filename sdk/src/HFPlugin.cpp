@@ -4,6 +4,9 @@
 // one place that hosts and modules share.
 HFPlugin::~HFPlugin() = default;
 
-bool HFPlugin::IsMergeEnabled() { return false; }
+bool HFPlugin::IsMergeEnabled()
+{
+    return false;
+}
 
 void HFPlugin::EnableMerge(const bool&) {}

@@ -38,30 +38,84 @@ wxString FindCatalogDirectory()
 }
 } // namespace
 
+namespace
+{
+// Reads <directory>/<language>/LC_MESSAGES/<domain>.mo. The stock file
+// loader also searches the application's data folders, which needs a wxApp
+// that a host may not have.
+class DirectoryLoader : public wxTranslationsLoader
+{
+public:
+    explicit DirectoryLoader(const wxString& directory) : m_directory(directory) {}
+
+    wxMsgCatalog* LoadCatalog(const wxString& domain, const wxString& language) override
+    {
+        wxFileName mo(m_directory, domain + ".mo");
+        mo.AppendDir(language);
+        mo.AppendDir("LC_MESSAGES");
+        return mo.FileExists() ? wxMsgCatalog::CreateFromFile(mo.GetFullPath(), domain) : nullptr;
+    }
+
+    wxArrayString GetAvailableTranslations(const wxString& domain) const override
+    {
+        wxArrayString languages;
+        wxDir dir;
+        if (!wxDir::Exists(m_directory) || !dir.Open(m_directory))
+            return languages;
+        wxString language;
+        for (bool more = dir.GetFirst(&language, "", wxDIR_DIRS); more;
+             more = dir.GetNext(&language))
+        {
+            wxFileName mo(m_directory, domain + ".mo");
+            mo.AppendDir(language);
+            mo.AppendDir("LC_MESSAGES");
+            if (mo.FileExists())
+                languages.Add(language);
+        }
+        return languages;
+    }
+
+private:
+    wxString m_directory;
+};
+
+wxTranslations* MakeTranslations(const wxString& directory, const wxString& language)
+{
+    auto* translations = new wxTranslations;
+    translations->SetLoader(new DirectoryLoader(directory));
+    translations->SetLanguage(language);
+    return translations;
+}
+} // namespace
+
 struct HFTranslations::Impl
 {
     wxString directory;
-    std::map<wxString, std::unique_ptr<wxMsgCatalog>> catalogs; // language -> catalogue
+    // One translations object per language, each holding that language's
+    // catalogue of the domain.
+    std::map<wxString, std::unique_ptr<wxTranslations>> catalogs;
     wxString selected;
 };
+
+namespace
+{
+const wxString* Lookup(const wxTranslations& translations, const wxString& english)
+{
+    const wxString* text = translations.GetTranslatedString(english, kDomain);
+    return text && !text->empty() ? text : nullptr;
+}
+} // namespace
 
 HFTranslations::HFTranslations() : m_pImpl(new Impl)
 {
     m_pImpl->directory = FindCatalogDirectory();
-    wxDir dir;
-    if (!wxDir::Exists(m_pImpl->directory) || !dir.Open(m_pImpl->directory))
-        return;
-    wxString language;
-    for (bool more = dir.GetFirst(&language, "", wxDIR_DIRS); more; more = dir.GetNext(&language))
+    const DirectoryLoader loader(m_pImpl->directory);
+    for (const wxString& language : loader.GetAvailableTranslations(kDomain))
     {
-        wxFileName mo(m_pImpl->directory, wxString(kDomain) + ".mo");
-        mo.AppendDir(language);
-        mo.AppendDir("LC_MESSAGES");
-        if (!mo.FileExists())
-            continue;
-        wxMsgCatalog* catalog = wxMsgCatalog::CreateFromFile(mo.GetFullPath(), kDomain);
-        if (catalog)
-            m_pImpl->catalogs[language].reset(catalog);
+        std::unique_ptr<wxTranslations> translations(
+            MakeTranslations(m_pImpl->directory, language));
+        if (translations->AddCatalog(kDomain))
+            m_pImpl->catalogs[language] = std::move(translations);
     }
 }
 
@@ -77,8 +131,8 @@ wxArrayString HFTranslations::GetTranslations(const wxString& english) const
     all.Add(english);
     for (const auto& entry : m_pImpl->catalogs)
     {
-        const wxString* text = entry.second->GetString(english);
-        if (text && !text->empty() && all.Index(*text) == wxNOT_FOUND)
+        const wxString* text = Lookup(*entry.second, english);
+        if (text && all.Index(*text) == wxNOT_FOUND)
             all.Add(*text);
     }
     return all;
@@ -89,8 +143,8 @@ wxString HFTranslations::Translate(const wxString& english) const
     auto found = m_pImpl->catalogs.find(m_pImpl->selected);
     if (found == m_pImpl->catalogs.end())
         return english;
-    const wxString* text = found->second->GetString(english);
-    return text && !text->empty() ? *text : english;
+    const wxString* text = Lookup(*found->second, english);
+    return text ? *text : english;
 }
 
 bool HFTranslations::SelectLanguage(const wxString& language)
@@ -102,16 +156,18 @@ bool HFTranslations::SelectLanguage(const wxString& language)
     m_pImpl->selected = known ? lang : wxString();
 
     // Make wxGetTranslation answer in the same language.
-    auto* translations = new wxTranslations;
-    wxFileTranslationsLoader::AddCatalogLookupPathPrefix(m_pImpl->directory);
-    translations->SetLanguage(m_pImpl->selected.empty() ? wxString("en") : m_pImpl->selected);
+    wxTranslations* translations = MakeTranslations(
+        m_pImpl->directory, m_pImpl->selected.empty() ? wxString("en") : m_pImpl->selected);
     wxTranslations::Set(translations);
     if (!m_pImpl->selected.empty())
         translations->AddCatalog(kDomain);
     return known;
 }
 
-wxString HFTranslations::GetSelectedLanguage() const { return m_pImpl->selected; }
+wxString HFTranslations::GetSelectedLanguage() const
+{
+    return m_pImpl->selected;
+}
 
 wxArrayString HFTranslations::AvailableLanguages() const
 {
@@ -121,4 +177,7 @@ wxArrayString HFTranslations::AvailableLanguages() const
     return languages;
 }
 
-wxString HFTranslations::CatalogDirectory() const { return m_pImpl->directory; }
+wxString HFTranslations::CatalogDirectory() const
+{
+    return m_pImpl->directory;
+}

@@ -3,8 +3,8 @@
 #include <wx/arrimpl.cpp>
 
 ReadyToProcessJobInfo::ReadyToProcessJobInfo(const ReadyToProcessJobInfo& other)
-    : filterId(other.filterId), jobName(other.jobName), files(other.files),
-      auxText(other.auxText), auxValue(other.auxValue)
+    : filterId(other.filterId), jobName(other.jobName), files(other.files), auxText(other.auxText),
+      auxValue(other.auxValue)
 {
 }
 

@@ -55,10 +55,11 @@ public:
 };
 
 // The module's entry points, looked up by name with dlsym.
-extern "C" {
-typedef void (*InitializePluginFn)();
-typedef void (*UninitializePluginFn)();
-typedef void (*GetPluginInfoFn)(PluginInfo*);
-typedef HFPlugin* (*GetPluginInstanceFn)(const wchar_t*);
-typedef void (*ReleasePluginInstanceFn)(HFPlugin*);
+extern "C"
+{
+    typedef void (*InitializePluginFn)();
+    typedef void (*UninitializePluginFn)();
+    typedef void (*GetPluginInfoFn)(PluginInfo*);
+    typedef HFPlugin* (*GetPluginInstanceFn)(const wchar_t*);
+    typedef void (*ReleasePluginInstanceFn)(HFPlugin*);
 }

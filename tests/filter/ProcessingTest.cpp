@@ -1,0 +1,195 @@
+// Jobs through the converter: results, outputs, progress, job overrides.
+#include <utility>
+#include <vector>
+
+#include <gtest/gtest.h>
+#include <wx/filename.h>
+
+#include "EPS.h"
+#include "SampleEps.h"
+#include "db/ConfigurationReader.h"
+#include "db/FilterConfiguration.h"
+#include "db/FolderConfiguration.h"
+#include "db/HFDatabase.h"
+#include "db/ImposeConfiguration.h"
+#include "db/JobConfiguration.h"
+#include "db/PreflightConfiguration.h"
+#include "db/Setting.h"
+
+namespace
+{
+struct Recorder : IProgressTracker
+{
+    std::vector<std::pair<wxString, int>> calls;
+    void ReportProgress(const wxString& path, int percent) override
+    {
+        calls.emplace_back(path, percent);
+    }
+};
+
+struct Jobs : ::testing::Test
+{
+    sample::ScratchDir in, out;
+    EPS eps{"x"};
+    Recorder progress;
+
+    void SetUp() override
+    {
+        // Normal mode with A4 as the page.
+        eps.GetSettings()["OUTPUTFILETYPEEPS"] = "0";
+        eps.GetSettings()["DEFAULTPAGESIZE"] = "A4 ";
+        eps.GetSettings()["FORCEPAGESIZEX"] = "595";
+        eps.GetSettings()["FORCEPAGESIZEY"] = "842";
+        wxXmlNode none(wxXML_ELEMENT_NODE, "Filter");
+        eps.InitilaizeFromPreference(&none);
+        WriteEmptyFolderConfig();
+    }
+
+    void WriteEmptyFolderConfig()
+    {
+        db::Setting setting;
+        setting.SetName("folder");
+        wxString saved;
+        db::HFDatabase::WriteFolderProperties(out.File("Folder.cfg"), setting,
+                                              db::JobConfiguration(), db::FolderConfiguration(),
+                                              db::FilterConfiguration(), db::ImposeConfiguration(),
+                                              db::PreflightConfiguration(), saved);
+    }
+
+    db::JobConfiguration::Map Overrides()
+    {
+        db::JobConfiguration job;
+        db::ConfigurationReader::ReadJobConfiguration(out.File("Folder.cfg"), job);
+        return job.GetProperties();
+    }
+
+    ReadyToProcessJobInfo Job(std::initializer_list<wxString> files)
+    {
+        ReadyToProcessJobInfo job;
+        job.filterId = "Orv.EPS.1";
+        for (const wxString& f : files)
+            job.files.Add(f);
+        return job;
+    }
+
+    wxString Eps(const wxString& name)
+    {
+        const wxString path = in.File(name);
+        sample::WriteFile(path, sample::RectangleEps(0, 0, 200, 100));
+        return path;
+    }
+};
+} // namespace
+
+TEST_F(Jobs, ConvertsIntoTheOutputFolderAndWritesThePageSize)
+{
+    const wxString input = Eps("art.work.eps");
+    wxString name;
+    EXPECT_EQ(eps.Process("", Job({input}), out.Path(), name, &progress), 0);
+    EXPECT_EQ(name, "art.work.ps");
+    EXPECT_TRUE(wxFileName::FileExists(out.File("art.work.ps")));
+    ASSERT_EQ(progress.calls.size(), 2u);
+    EXPECT_EQ(progress.calls[0], std::make_pair(input, 10));
+    EXPECT_EQ(progress.calls[1], std::make_pair(input, 100));
+
+    const auto overrides = Overrides();
+    ASSERT_EQ(overrides.size(), 1u);
+    EXPECT_EQ(overrides.at("PageSize").GetValue(), "A4"); // trailing blank trimmed
+}
+
+TEST_F(Jobs, CustomPageSizeOverridesKeepTheStoredTexts)
+{
+    eps.GetSettings()["CUSTOMPAGESIZE"] = "1";
+    eps.GetSettings()["FORCEPAGESIZEX"] = "612";
+    eps.GetSettings()["FORCEPAGESIZEY"] = "792.500000";
+    wxString name;
+    EXPECT_EQ(eps.Process("", Job({Eps("a.eps")}), out.Path(), name, nullptr), 0);
+    const auto overrides = Overrides();
+    ASSERT_EQ(overrides.size(), 2u);
+    EXPECT_EQ(overrides.at("PageSize").GetValue(), "Custom");
+    EXPECT_EQ(overrides.at("CustomPageSize").GetValue(), "612 792.500000");
+    EXPECT_EQ(overrides.at("CustomPageSize").GetDisplayValue(), "612 792.500000");
+}
+
+TEST_F(Jobs, OnlyTheLastFileDecides)
+{
+    const wxString first = Eps("first.eps"), second = Eps("second.eps");
+    // A directory where the first output should go makes its conversion fail.
+    out.Sub("first.ps");
+    wxString name;
+    EXPECT_EQ(eps.Process("", Job({first, second}), out.Path(), name, &progress), 0);
+    EXPECT_EQ(name, "second.ps");
+    EXPECT_EQ(progress.calls.size(), 4u);
+    EXPECT_EQ(Overrides().count("PageSize"), 1u);
+
+    // The other way round the job fails and writes no overrides.
+    WriteEmptyFolderConfig();
+    out.Sub("second2.ps");
+    const wxString second2 = Eps("second2.eps");
+    EXPECT_EQ(eps.Process("", Job({first, second2}), out.Path(), name, nullptr), -1003);
+    EXPECT_EQ(eps.GetStatus(), -1003);
+    EXPECT_EQ(name, "second2.ps");
+    EXPECT_TRUE(Overrides().empty());
+}
+
+TEST_F(Jobs, NonEpsStopsAtOnceAfterTheFirstReport)
+{
+    const wxString good = Eps("good.eps");
+    const wxString bad = in.File("bad.eps");
+    sample::WriteFile(bad, "plain text\n");
+    const wxString after = Eps("after.eps");
+    wxString name;
+    EXPECT_EQ(eps.Process("", Job({good, bad, after}), out.Path(), name, &progress), -1005);
+    EXPECT_EQ(eps.GetStatus(), -1005);
+    EXPECT_TRUE(wxFileName::FileExists(out.File("good.ps")));
+    EXPECT_FALSE(wxFileName::FileExists(out.File("after.ps")));
+    ASSERT_EQ(progress.calls.size(), 3u);
+    EXPECT_EQ(progress.calls[2], std::make_pair(bad, 10));
+    EXPECT_TRUE(Overrides().empty());
+}
+
+TEST_F(Jobs, EmptyJobsAndMissingFilter)
+{
+    wxString name = "unchanged";
+    EXPECT_EQ(eps.Process("", Job({}), out.Path(), name, &progress), -1002);
+    ReadyToProcessJobInfo anonymous = Job({Eps("a.eps")});
+    anonymous.filterId.clear();
+    EXPECT_EQ(eps.Process("", anonymous, out.Path(), name, &progress), -1006);
+    EXPECT_EQ(eps.GetStatus(), -1006);
+    EXPECT_EQ(name, "unchanged");
+    EXPECT_TRUE(progress.calls.empty());
+}
+
+TEST_F(Jobs, PassThroughTouchesNothing)
+{
+    EPS passThrough("p");
+    wxXmlNode none(wxXML_ELEMENT_NODE, "Filter");
+    passThrough.InitilaizeFromPreference(&none); // the constructor's default is pass-through
+    ASSERT_TRUE(passThrough.IsOutputTypeOne());
+    const wxString a = Eps("a.eps");
+    const wxString b = in.File("b.EPS");
+    sample::WriteFile(b, "not even EPS");
+    wxString name;
+    EXPECT_EQ(passThrough.Process("", Job({a, b}), out.Path(), name, &progress), 0);
+    EXPECT_EQ(name, "b.EPS");
+    EXPECT_EQ(progress.calls.size(), 4u);
+    EXPECT_EQ(progress.calls[3], std::make_pair(b, 100));
+    EXPECT_FALSE(wxFileName::FileExists(out.File("a.ps")));
+    EXPECT_TRUE(Overrides().empty());
+}
+
+TEST_F(Jobs, SubstrateFamiliesMeanNoOverrides)
+{
+    eps.Initialize("<S><SubstrateFamilySupported>yes</SubstrateFamilySupported></S>");
+    wxString name;
+    EXPECT_EQ(eps.Process("", Job({Eps("a.eps")}), out.Path(), name, nullptr), 0);
+    EXPECT_TRUE(Overrides().empty());
+}
+
+TEST_F(Jobs, NoFolderConfigurationNoOverridesNoFailure)
+{
+    wxRemoveFile(out.File("Folder.cfg"));
+    wxString name;
+    EXPECT_EQ(eps.Process("", Job({Eps("a.eps")}), out.Path(), name, nullptr), 0);
+    EXPECT_FALSE(wxFileName::FileExists(out.File("Folder.cfg")));
+}

@@ -1,0 +1,136 @@
+// Which files become jobs, which go back to the host, which are dropped.
+#include <gtest/gtest.h>
+
+#include "EPS.h"
+#include "SampleEps.h"
+
+namespace
+{
+struct Folder : ::testing::Test
+{
+    sample::ScratchDir dir;
+    EPS eps{"x"};
+    wxString Eps(const wxString& name)
+    {
+        const wxString path = dir.File(name);
+        sample::WriteFile(path, sample::RectangleEps(0, 0, 100, 50));
+        return path;
+    }
+    wxString Text(const wxString& name, const std::string& content = "hello\n")
+    {
+        const wxString path = dir.File(name);
+        sample::WriteFile(path, content);
+        return path;
+    }
+};
+
+wxArrayString List(std::initializer_list<wxString> items)
+{
+    wxArrayString list;
+    for (const wxString& item : items)
+        list.Add(item);
+    return list;
+}
+} // namespace
+
+TEST_F(Folder, FileListAcceptsEpsAndReportsEarlierRefusals)
+{
+    const wxString a = Text("a.txt"), b = Eps("b.eps"), c = Text("c.txt");
+    wxArrayString second = List({"stale"}), rejected;
+    JobInfoCollection jobs;
+    EXPECT_EQ(eps.SniffFiles(List({a, b, c}), second, rejected, jobs), 0);
+    ASSERT_EQ(jobs.GetCount(), 1u);
+    EXPECT_EQ(jobs[0].filterId, "Orv.EPS.1");
+    EXPECT_EQ(jobs[0].jobName, "b.eps");
+    ASSERT_EQ(jobs[0].files.size(), 1u);
+    EXPECT_EQ(jobs[0].files[0], b);
+    EXPECT_TRUE(jobs[0].auxText.empty());
+    EXPECT_EQ(jobs[0].auxValue, 0u);
+    EXPECT_EQ(rejected, List({a}));
+    EXPECT_TRUE(second.empty());
+}
+
+TEST_F(Folder, ExtensionInAnyCaseButOnlyEps)
+{
+    const wxString mixed = Eps("x.EpS"), ps = Eps("x.ps"), epsf = Eps("x.epsf");
+    const wxString fake = Text("fake.eps", "%!PS-Adobe-3.0\nnot encapsulated\n");
+    wxArrayString second, rejected;
+    JobInfoCollection jobs;
+    eps.SniffFiles(List({ps, epsf, fake, mixed}), second, rejected, jobs);
+    ASSERT_EQ(jobs.GetCount(), 1u);
+    EXPECT_EQ(jobs[0].jobName, "x.EpS");
+    EXPECT_EQ(rejected, List({ps, epsf, fake}));
+}
+
+TEST_F(Folder, EmptyPathStopsButKeepsEarlierJobs)
+{
+    const wxString first = Eps("1.eps"), later = Eps("2.eps");
+    wxArrayString second, rejected;
+    JobInfoCollection jobs;
+    EXPECT_EQ(eps.SniffFiles(List({first, "", later}), second, rejected, jobs), -1002);
+    EXPECT_EQ(eps.GetStatus(), -1002);
+    EXPECT_EQ(jobs.GetCount(), 1u);
+
+    jobs.Clear();
+    EXPECT_EQ(eps.SniffFiles(wxArrayString(), second, rejected, jobs), 0);
+    EXPECT_EQ(jobs.GetCount(), 0u);
+    EXPECT_TRUE(rejected.empty());
+}
+
+TEST_F(Folder, FolderListingDropsFakeEpsAndRefusesOthers)
+{
+    Eps("good.eps");
+    const wxString note = Text("note.txt");
+    Text("bad.eps", "not PostScript at all\n");
+    dir.Sub("sub");
+    sample::WriteFile(dir.File("sub/inner.eps"), sample::RectangleEps(0, 0, 10, 10));
+    wxArrayString rejected;
+    JobInfoCollection jobs;
+    EXPECT_EQ(eps.SniffFolder(dir.Path(), rejected, jobs), 0);
+    ASSERT_EQ(jobs.GetCount(), 1u);
+    EXPECT_EQ(jobs[0].jobName, "good.eps");
+    EXPECT_EQ(rejected, List({note}));
+}
+
+TEST_F(Folder, HostListingIsUsedAsGiven)
+{
+    const wxString listed = Eps("listed.eps");
+    Eps("unlisted.eps");
+    FolderContent content;
+    content.m_arrFiles.Add(listed);
+    FolderContent* pointer = &content;
+    wxArrayString rejected;
+    JobInfoCollection jobs;
+    EXPECT_EQ(eps.SniffFolder(dir.Path(), rejected, jobs, pointer), 0);
+    ASSERT_EQ(jobs.GetCount(), 1u);
+    EXPECT_EQ(jobs[0].files[0], listed);
+}
+
+TEST_F(Folder, PpmlJobsAreLeftAloneOrRefusedWhole)
+{
+    const wxString artwork = Eps("art.eps");
+    dir.Sub("job");
+    Text("job/Job.PPML", "<PPML/>");
+    EXPECT_TRUE(eps.IsPPMLFolder(dir.Path()));
+
+    wxArrayString rejected;
+    JobInfoCollection jobs;
+    eps.GetSettings(); // status untouched by the three-argument form
+    EXPECT_EQ(eps.SniffFolder(dir.Path(), rejected, jobs), 0);
+    EXPECT_EQ(jobs.GetCount(), 0u);
+    EXPECT_TRUE(rejected.empty());
+
+    FolderContent content;
+    content.m_arrFiles.Add(artwork);
+    content.m_arrFiles.Add(dir.File("job/Job.PPML"));
+    FolderContent* pointer = &content;
+    rejected.Add("replaced");
+    EXPECT_EQ(eps.SniffFolder(dir.Path(), rejected, jobs, pointer), 0);
+    EXPECT_EQ(rejected, content.m_arrFiles);
+    EXPECT_EQ(jobs.GetCount(), 0u);
+
+    // A second PPML file makes it an ordinary folder again.
+    Text("other.PPML", "<PPML/>");
+    EXPECT_FALSE(eps.IsPPMLFolder(dir.Path()));
+    EXPECT_FALSE(eps.IsPPMLFolder(dir.File("missing")));
+}
