@@ -24,6 +24,8 @@ public:
     void OnCustomWidth(wxCommandEvent& event);
     void OnCustomHeight(wxCommandEvent& event);
     void OnOK(wxCommandEvent& event);
+    // What OK checks: the sizes against the limits, then the validators.
+    bool AcceptSizes();
 
     // Shows the stored sizes in the current unit and moves the limits from
     // `previousUnit` to it.

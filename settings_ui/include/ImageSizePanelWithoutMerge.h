@@ -69,5 +69,6 @@ protected:
 
 private:
     void EnableControls(const EnableRequests& requests);
+    void TransferImageControlsToWindow();
     void ChangeFieldUnit(int comboId, int textId, wxString& unitText, wxString& valueText);
 };

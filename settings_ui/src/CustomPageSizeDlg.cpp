@@ -246,13 +246,18 @@ bool CustomPageSizeDlg::MinMaxDoubleEx(double value, double minimum, double maxi
     return true;
 }
 
-void CustomPageSizeDlg::OnOK(wxCommandEvent&)
+bool CustomPageSizeDlg::AcceptSizes()
 {
     UpdateSizes(m_eUnit);
     if (!MinMaxDoubleEx(m_dWidth, m_dMinWidth, m_dMaxWidth, 0))
-        return;
+        return false;
     if (!MinMaxDoubleEx(m_dHeight, m_dMinHeight, m_dMaxHeight, 1))
-        return;
-    if (Validate() && TransferDataFromWindow())
+        return false;
+    return Validate() && TransferDataFromWindow();
+}
+
+void CustomPageSizeDlg::OnOK(wxCommandEvent&)
+{
+    if (AcceptSizes())
         EndModal(wxID_OK);
 }
