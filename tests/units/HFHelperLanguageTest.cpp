@@ -114,7 +114,7 @@ TEST_F(AppLanguage, EnglishAndBrazilianPortugueseGoThroughTheirAliases)
 {
     if (!HasLocale("en_US.UTF-8") || !HasLocale("pt_BR.UTF-8"))
         GTEST_SKIP() << "en_US/pt_BR locales are not installed (scripts/setup.sh)";
-    ClientEnvironment::WriteLanguageFile("pt_BR");
+    ClientEnvironment::WriteLanguageFile("PT_br");
     EXPECT_EQ(",", HFHelper::GetDecimalSeparatorFromAppLang());
     EXPECT_EQ("pt_BR.UTF-8", CurrentNumericLocale());
     ClientEnvironment::WriteLanguageFile("en_US");

@@ -83,7 +83,7 @@ wxString HFHelper::GetLanguageFileDirectory()
     // $HOME/.<app>, so the directory ends up as $HOME/Vomal QDK.
     // Without an application object there are no standard paths; the
     // parent of the user data directory is then the home directory.
-    wxString base =
+    const wxString base =
         wxTheApp
             ? wxStandardPaths::Get().GetUserDataDir().BeforeLast(wxFileName::GetPathSeparator())
             : wxFileName::GetHomeDir();
@@ -98,21 +98,22 @@ int HFHelper::GetLanguageID()
     const wxFileName languageFile(GetLanguageFileDirectory(), "current.lang");
     if (languageFile.FileExists())
     {
-        const wxString line = FirstLineOf(languageFile.GetFullPath());
-        wxString name = line;
+        wxString name = FirstLineOf(languageFile.GetFullPath());
+        wxString code;
         for (const LanguageCode& language : kLanguages)
         {
-            if (line.CmpNoCase(language.code) == 0)
+            if (name.CmpNoCase(language.code) == 0)
             {
+                code = language.code;
                 name = language.name;
                 break;
             }
         }
         // wxWidgets 3.2 renamed some languages ("English (United States)",
-        // "Portuguese (Brazil)"); the code itself still finds those.
+        // "Portuguese (Brazil)"); their code still finds them.
         const wxLanguageInfo* info = wxLocale::FindLanguageInfo(name);
-        if (!info && name != line)
-            info = wxLocale::FindLanguageInfo(line);
+        if (!info && !code.empty())
+            info = wxLocale::FindLanguageInfo(code);
         if (info)
             return info->Language;
     }
