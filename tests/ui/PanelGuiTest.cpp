@@ -51,52 +51,6 @@ Keys LetterDefaults()
     };
 }
 
-// Answers the custom page size dialog: switches it to points, types the
-// size and presses OK (with OK's own checks).
-class EnterCustomSizeInPoints : public wxExpectModalBase<CustomPageSizeDlg>
-{
-public:
-    EnterCustomSizeInPoints(wxString width, wxString height)
-        : m_width(std::move(width)), m_height(std::move(height))
-    {
-    }
-
-protected:
-    int OnInvoked(CustomPageSizeDlg* dialog) const override
-    {
-        ClickRadio(wxDynamicCast(dialog->FindWindow(ID_CUSTOM_UNIT_POINT), wxRadioButton));
-        TypeText(wxDynamicCast(dialog->FindWindow(ID_CUSTOM_WIDTH_TEXT), wxTextCtrl), m_width);
-        TypeText(wxDynamicCast(dialog->FindWindow(ID_CUSTOM_HEIGHT_TEXT), wxTextCtrl), m_height);
-        return dialog->AcceptSizes() ? wxID_OK : wxID_CANCEL;
-    }
-
-private:
-    wxString m_width, m_height;
-};
-
-class CancelCustomSize : public wxExpectModalBase<CustomPageSizeDlg>
-{
-protected:
-    int OnInvoked(CustomPageSizeDlg*) const override { return wxID_CANCEL; }
-};
-
-// A message box whose text must contain `part`.
-class ExpectMessageContaining : public wxExpectModalBase<wxMessageDialog>
-{
-public:
-    explicit ExpectMessageContaining(wxString part) : m_part(std::move(part)) {}
-
-protected:
-    int OnInvoked(wxMessageDialog* dialog) const override
-    {
-        EXPECT_NE(wxNOT_FOUND, dialog->GetMessage().Find(m_part))
-            << dialog->GetMessage().ToStdString();
-        return wxID_OK;
-    }
-
-private:
-    wxString m_part;
-};
 } // namespace
 
 class SettingsPanel : public PanelTest
