@@ -5,6 +5,7 @@
 #include <memory>
 #include <string>
 #include <sys/stat.h>
+#include <unistd.h>
 
 #include <gtest/gtest.h>
 #include <wx/init.h>
@@ -30,7 +31,14 @@ public:
         ASSERT_TRUE(m_wx->IsOk());
     }
 
-    void TearDown() override { m_wx.reset(); }
+    void TearDown() override
+    {
+        m_wx.reset();
+        // The temporary home holds at most the language file's directory.
+        RemoveLanguageFile();
+        rmdir((s_home + "/Vomal QDK").c_str());
+        rmdir(s_home.c_str());
+    }
 
     std::string ResourcesDir() const
     {
