@@ -48,6 +48,8 @@ void ReportShortRead(FILE* in, unsigned long bytesLeft)
 
 void ExtractEPSfromTIFFpreview(FILE* in, FILE* out, long offset, long length)
 {
+    if (!in || !out)
+        return;
     size_t bufferSize = 0;
     char* buffer = AllocateCopyBuffer(&bufferSize);
     if (!buffer)
