@@ -1,0 +1,163 @@
+// Sniffing a folder of many EPS files through the filter, against the least
+// any sniffer must do: list the folder, open every file and read its first
+// 64 KB. Optionally the reference host's whole run over a smaller folder,
+// against copying the same files.
+//
+// usage: bench_sniff [files] [bytes-per-file] [runs] [host-files]
+//        defaults 10000, 8192, 5, 500 (host-files 0 skips the host run)
+#include <dirent.h>
+#include <fcntl.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <chrono>
+#include <cstdio>
+#include <cstdlib>
+#include <functional>
+#include <string>
+#include <vector>
+
+#include <wx/init.h>
+#include <wx/log.h>
+
+#include "EPS.h"
+#include "HostRun.h"
+#include "SampleFolder.h"
+
+namespace
+{
+constexpr size_t kFloorRead = 64 * 1024;
+
+double Seconds(const std::function<void()>& work)
+{
+    const auto start = std::chrono::steady_clock::now();
+    work();
+    return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
+}
+
+double Median(int runs, const std::function<void()>& work)
+{
+    std::vector<double> times;
+    for (int i = 0; i < runs; ++i)
+        times.push_back(Seconds(work));
+    std::sort(times.begin(), times.end());
+    return times[times.size() / 2];
+}
+
+std::vector<std::string> ListFiles(const std::string& folder)
+{
+    std::vector<std::string> files;
+    if (DIR* dir = opendir(folder.c_str()))
+    {
+        while (const dirent* entry = readdir(dir))
+            if (entry->d_type == DT_REG)
+                files.push_back(folder + "/" + entry->d_name);
+        closedir(dir);
+    }
+    return files;
+}
+
+// The floor: list, open, read up to 64 KB, close. Returns the files read.
+size_t ReadHeads(const std::string& folder, std::vector<char>& buffer)
+{
+    size_t count = 0;
+    for (const std::string& path : ListFiles(folder))
+    {
+        const int fd = open(path.c_str(), O_RDONLY | O_CLOEXEC);
+        if (fd < 0)
+            continue;
+        if (read(fd, buffer.data(), kFloorRead) >= 0)
+            ++count;
+        close(fd);
+    }
+    return count;
+}
+
+// The host run's floor: read every file whole and write a copy.
+void CopyAll(const std::string& from, const std::string& to, std::vector<char>& buffer)
+{
+    for (const std::string& path : ListFiles(from))
+    {
+        const int in = open(path.c_str(), O_RDONLY | O_CLOEXEC);
+        const std::string target = to + path.substr(path.rfind('/'));
+        const int out = open(target.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, 0644);
+        ssize_t got = 0;
+        while (in >= 0 && out >= 0 && (got = read(in, buffer.data(), buffer.size())) > 0)
+            if (write(out, buffer.data(), static_cast<size_t>(got)) != got)
+                break;
+        if (in >= 0)
+            close(in);
+        if (out >= 0)
+            close(out);
+    }
+}
+
+int Argument(int argc, char** argv, int index, int fallback)
+{
+    return argc > index ? std::atoi(argv[index]) : fallback;
+}
+
+void BenchHost(int hostFiles, long bytesEach, std::vector<char>& buffer)
+{
+    const std::string folder = sniffbench::MakeScratchDirectory("hf-bench-host");
+    const sniffbench::HostRunResult host = sniffbench::RunHost(folder, hostFiles, bytesEach);
+    if (!host.ran)
+    {
+        std::printf("\nhotfolder run: host or module not built, or the run failed; skipped\n");
+        sniffbench::RemoveTree(folder);
+        return;
+    }
+    // The host moved the originals away; write them again for the floor.
+    const std::string copies = sniffbench::MakeScratchDirectory("hf-bench-copies");
+    sniffbench::WriteEpsFiles(folder, hostFiles, bytesEach);
+    const double copy = Seconds([&] { CopyAll(folder, copies, buffer); });
+    std::printf("\nhotfolder run --stats over %d files\n", hostFiles);
+    std::printf("  whole run           %8.3f s   %.1f jobs per second\n", host.wallSeconds,
+                host.jobsPerSecond);
+    std::printf("  host's sniffing     %8.3f s\n", host.sniffSeconds);
+    std::printf("  copy every file     %8.3f s   ratio run/copy %.3f\n", copy,
+                host.wallSeconds / copy);
+    sniffbench::RemoveTree(copies);
+    sniffbench::RemoveTree(folder);
+}
+} // namespace
+
+int main(int argc, char** argv)
+{
+    const int files = Argument(argc, argv, 1, 10000);
+    const long bytesEach = Argument(argc, argv, 2, 8192);
+    const int runs = std::max(1, Argument(argc, argv, 3, 5));
+    const int hostFiles = Argument(argc, argv, 4, 500);
+
+    wxInitializer toolkit;
+    wxLog::EnableLogging(false);
+    const std::string folder = sniffbench::MakeScratchDirectory("hf-bench-sniff");
+    std::printf("Writing %d EPS files of %ld bytes in %s ...\n", files, bytesEach, folder.c_str());
+    sniffbench::WriteEpsFiles(folder, files, bytesEach);
+
+    std::vector<char> buffer(kFloorRead);
+    const size_t warmed = ReadHeads(folder, buffer); // page cache warm for both sides
+    EPS filter("EPS");
+    size_t accepted = 0;
+    const double sniff = Median(runs,
+                                [&]
+                                {
+                                    wxArrayString rejected;
+                                    JobInfoCollection jobs;
+                                    filter.SniffFolder(folder, rejected, jobs);
+                                    accepted = jobs.size();
+                                });
+    const double floor = Median(runs, [&] { ReadHeads(folder, buffer); });
+
+    std::printf("\nSniffing %d files (median of %d runs)\n", files, runs);
+    std::printf("  EPS::SniffFolder    %8.3f s   %zu jobs\n", sniff, accepted);
+    std::printf("  open + read 64 KB   %8.3f s   %zu files   ratio sniff/read %.3f "
+                "(target <= 1.5)\n",
+                floor, warmed, sniff / floor);
+    sniffbench::RemoveTree(folder);
+
+    if (hostFiles > 0)
+        BenchHost(hostFiles, bytesEach, buffer);
+    // Sniffing that loses files is no benchmark result.
+    return accepted == static_cast<size_t>(files) ? 0 : 1;
+}
