@@ -149,7 +149,8 @@ TEST_F(SettingsPanel, CustomPageSizeIsWrittenInPointsWithATruncatedCommand)
     expected["CUSTOMPAGEWIDTH"] = "595.500000";
     expected["CUSTOMPAGEHEIGHT"] = "842.900000";
     expected["CUSTOMPAGETUNIT"] = "0";
-    expected["PAGESIZE_COMMAND"] = "\n595 842 0 0 1 pop pop setpagedevice";
+    expected["PAGESIZE_COMMAND"] =
+        "\n595 842 0 0 1 pop pop pop 2 array astore << /PageSize 3 -1 roll >> setpagedevice";
     EXPECT_EQ(expected, Sorted(settings));
 
     // A server paper afterwards replaces the page description again.
