@@ -1,4 +1,6 @@
 // Jobs through the converter: results, outputs, progress, job overrides.
+#include <clocale>
+#include <string>
 #include <utility>
 #include <vector>
 
@@ -192,4 +194,25 @@ TEST_F(Jobs, NoFolderConfigurationNoOverridesNoFailure)
     wxString name;
     EXPECT_EQ(eps.Process("", Job({Eps("a.eps")}), out.Path(), name, nullptr), 0);
     EXPECT_FALSE(wxFileName::FileExists(out.File("Folder.cfg")));
+}
+
+TEST_F(Jobs, DecimalCommaLanguageStillWritesPoints)
+{
+    const std::string saved = std::setlocale(LC_ALL, nullptr);
+    if (!std::setlocale(LC_ALL, "de_DE.UTF-8"))
+        GTEST_SKIP() << "de_DE.UTF-8 is not generated";
+    // What a German application language leaves behind: a decimal-comma C
+    // locale. The stored settings keep their points.
+    eps.GetSettings()["IMAGEEABLESIZELLX"] = "12.5";
+    eps.GetSettings()["IMAGEEABLESIZELLY"] = "12.5";
+    eps.GetSettings()["IMAGEEABLESIZEURX"] = "582.5";
+    eps.GetSettings()["IMAGEEABLESIZEURY"] = "829.5";
+    eps.LoadEPSParams();
+    wxString name;
+    const long status = eps.Process("", Job({Eps("komma.eps")}), out.Path(), name, nullptr);
+    std::setlocale(LC_ALL, saved.c_str());
+    ASSERT_EQ(status, 0);
+    const std::string ps = sample::ReadFile(out.File("komma.ps"));
+    EXPECT_NE(ps.find("%%HiResBoundingBox: 12.5 12.5 582.5 829.5\r\n"), std::string::npos);
+    EXPECT_EQ(ps.find("12,5"), std::string::npos);
 }

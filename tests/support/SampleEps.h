@@ -37,6 +37,20 @@ inline bool WriteFile(const wxString& path, const std::string& bytes)
     return std::fclose(f) == 0 && ok;
 }
 
+inline std::string ReadFile(const wxString& path)
+{
+    std::string bytes;
+    FILE* f = std::fopen(path.fn_str(), "rb");
+    if (!f)
+        return bytes;
+    char buffer[65536];
+    size_t n;
+    while ((n = std::fread(buffer, 1, sizeof buffer, f)) > 0)
+        bytes.append(buffer, n);
+    std::fclose(f);
+    return bytes;
+}
+
 // A DOS EPS binary: 30-byte header, then the PostScript section, then a
 // fake preview the converter must leave behind.
 inline std::string DosEpsBinary(const std::string& postscript, const std::string& preview)
