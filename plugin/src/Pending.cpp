@@ -1,2 +1,0 @@
-// The settings panel lands separately; until then the filter offers none.
-#include "EPS.h"
