@@ -1,0 +1,13 @@
+#!/usr/bin/env bash
+# Renders the settings panel (English and German) and the custom page size
+# dialog into docs/ under a virtual display.
+# Usage: scripts/screenshots.sh [build-directory]
+set -euo pipefail
+root="$(cd "$(dirname "$0")/.." && pwd)"
+build="${1:-$root/build}"
+cmake -S "$root" -B "$build" >/dev/null
+cmake --build "$build" --target ui_panel_screenshots hf_catalogues -j2
+for language in en de; do
+  xvfb-run -a -s "-screen 0 1280x1024x24" "$build/bin/ui_panel_screenshots" "$root/docs" "$language"
+done
+ls -1 "$root"/docs/settings-panel-*.png "$root"/docs/custom-page-size-*.png

@@ -1,0 +1,115 @@
+// Renders the EPS settings panel and the custom page size dialog to PNG
+// files, for the documentation. Usage: ui_panel_screenshots <dir> <en|de>
+#include <wx/app.h>
+#include <wx/dcmemory.h>
+#include <wx/dcscreen.h>
+#include <wx/frame.h>
+#include <wx/image.h>
+#include <wx/sizer.h>
+#include <wx/stopwatch.h>
+
+#include <hotfolder/HFTranslations.h>
+
+#include "ControlIds.h"
+#include "CustomPageSizeDlg.h"
+#include "ImageSizePanelWithoutMerge.h"
+#include "PanelFactories.h"
+
+namespace
+{
+void Pump(int milliseconds)
+{
+    wxStopWatch watch;
+    while (watch.Time() < milliseconds)
+    {
+        wxTheApp->ProcessPendingEvents();
+        wxYield();
+        wxMilliSleep(10);
+    }
+}
+
+// Reads back what the display shows of the window.
+bool SaveWindow(wxWindow* window, const wxString& path)
+{
+    window->Raise();
+    window->Refresh();
+    window->Update();
+    Pump(400);
+    const wxRect rect = window->GetScreenRect();
+    wxBitmap bitmap(rect.GetSize());
+    wxMemoryDC memory(bitmap);
+    wxScreenDC screen;
+    memory.Blit(0, 0, rect.width, rect.height, &screen, rect.x, rect.y);
+    memory.SelectObject(wxNullBitmap);
+    return bitmap.SaveFile(path, wxBITMAP_TYPE_PNG);
+}
+
+wxString ReadFile(const wxString& path)
+{
+    wxString text;
+    if (FILE* file = fopen(path.mb_str(), "rb"))
+    {
+        char buffer[4096];
+        size_t read = 0;
+        std::string bytes;
+        while ((read = fread(buffer, 1, sizeof buffer, file)) > 0)
+            bytes.append(buffer, read);
+        fclose(file);
+        text = wxString::FromUTF8(bytes.c_str());
+    }
+    return text;
+}
+
+class ScreenshotApp : public wxApp
+{
+public:
+    bool OnInit() override
+    {
+        if (argc < 3)
+            return false;
+        const wxString directory = argv[1];
+        const wxString language = argv[2];
+        wxInitAllImageHandlers();
+        HFTranslations::GetInstance()->SelectLanguage(language);
+
+        auto* frame = new wxFrame(nullptr, wxID_ANY, "EPS", wxPoint(0, 0));
+        const wxString xml = ReadFile(wxString(HF_TEST_DATA_DIR) + "/ui/server-ui.xml");
+        auto* panel = wxDynamicCast(ImageSizePanelWithoutMerge_Factory::CreateInstance(
+                                        frame, xml, "EPS", ".eps", true, true),
+                                    ImageSizePanelWithoutMerge);
+        MapPropToValue settings;
+        settings["OUTPUTFILETYPEEPS"] = "0";
+        settings["ORIGINALSIZE"] = "0";
+        settings["CUSTOMSIZE"] = "1";
+        settings["ORIGINALWIDTH"] = "4.5";
+        panel->LoadUISettings(settings);
+        auto* sizer = new wxBoxSizer(wxVERTICAL);
+        sizer->Add(panel, 1, wxEXPAND);
+        frame->SetSizerAndFit(sizer);
+        frame->Show();
+        m_ok = SaveWindow(panel, directory + "/settings-panel-" + language + ".png");
+
+        bool heightIsLength = false;
+        auto* dialog = new CustomPageSizeDlg(
+            frame, wxID_ANY, HFTranslations::GetInstance()->Translate("Custom page size"), 1, 13.89,
+            1, 19.44, 8.5, 11, UNIT_INCH, heightIsLength);
+        dialog->Move(0, 0);
+        dialog->Show();
+        m_ok = SaveWindow(dialog, directory + "/custom-page-size-" + language + ".png") && m_ok;
+        dialog->Destroy();
+        frame->Destroy();
+        return true;
+    }
+    int OnRun() override { return m_ok ? 0 : 1; }
+
+private:
+    bool m_ok = false;
+};
+} // namespace
+
+wxIMPLEMENT_APP_NO_MAIN(ScreenshotApp);
+
+int main(int argc, char** argv)
+{
+    return wxEntry(argc, argv);
+}
