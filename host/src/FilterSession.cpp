@@ -19,6 +19,7 @@ std::unique_ptr<FilterSession> FilterSession::Start(const wxString& modulePath,
         error = wxString::Format("the filter module %s could not make a filter object", modulePath);
         return nullptr;
     }
+    session->m_serverDescription = serverDescription;
     long status = session->m_plugin->Initialize(serverDescription);
     if (status != 0)
     {
@@ -55,6 +56,12 @@ wxString FilterSession::DescribeStatus(long code)
     if (!m_plugin || !m_plugin->GetErrorString(code, text) || text.empty())
         text = "unknown status";
     return wxString::Format("%s (%ld)", text, code);
+}
+
+void FilterSession::ClearStatusAfterFailure()
+{
+    if (m_plugin)
+        m_plugin->Initialize(m_serverDescription);
 }
 
 wxXmlNode* MakeDefaultFilterNode(const wxString& modulePath, wxString& error, PluginInfo* described)

@@ -25,12 +25,16 @@ public:
     const FilterModule& Module() const { return *m_module; }
     // The filter's own text for a status code, with the code appended.
     wxString DescribeStatus(long code);
+    // A filter keeps its last status and answers it for later jobs too, so
+    // after a failed job it is initialised again (which clears the status).
+    void ClearStatusAfterFailure();
 
 private:
     FilterSession() = default;
     std::unique_ptr<FilterModule> m_module;
     PluginInfo m_info;
     PluginPtr m_plugin;
+    wxString m_serverDescription;
 };
 
 // A "Filter" element named by the filter's identifier holding what a freshly

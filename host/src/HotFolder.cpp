@@ -3,6 +3,7 @@
 #include <sys/stat.h>
 
 #include <wx/filename.h>
+#include <wx/log.h>
 #include <wx/xml/xml.h>
 
 #include "db/ConfigurationReader.h"
@@ -29,6 +30,7 @@ bool HotFolder::Open(const wxString& folder, wxString& error)
         return false;
     }
     m_configFile = db::PathResolver::GetContainerFolder_SettingFilePath(m_folder);
+    wxLogNull quiet; // the store logs parse errors; the host reports in one line
     int read = db::HFDatabase::ReadSetting(m_configFile, m_setting);
     if (read == 0)
     {

@@ -48,6 +48,7 @@ JobOutcome JobRunner::Run(const ReadyToProcessJobInfo& job, size_t index, size_t
     m_statistics.processSeconds += output.processSeconds;
     if (output.status != 0 || output.producedPath.empty())
     {
+        m_session.ClearStatusAfterFailure();
         RemoveTree(work);
         return Fail(job, output.status != 0 ? m_session.DescribeStatus(output.status)
                                             : wxString("the filter reported no output file"));
