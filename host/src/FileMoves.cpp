@@ -59,7 +59,7 @@ static bool CopyBytes(int in, int out)
     }
 }
 
-bool CopyFileTo(const wxString& file, const wxString& target, wxString& error)
+bool CopyFileTo(const wxString& file, const wxString& target, wxString& error, bool sync)
 {
     int in = open(Native(file).c_str(), O_RDONLY | O_CLOEXEC);
     if (in < 0)
@@ -74,7 +74,7 @@ bool CopyFileTo(const wxString& file, const wxString& target, wxString& error)
         close(in);
         return false;
     }
-    bool copied = CopyBytes(in, out) && fsync(out) == 0;
+    bool copied = CopyBytes(in, out) && (!sync || fsync(out) == 0);
     int saved = errno;
     close(in);
     if (close(out) != 0)
@@ -100,7 +100,7 @@ static bool MoveByCopy(const wxString& file, const wxString& directory, const wx
 {
     wxString temporary = wxFileName(directory, ".hotfolder-move-" + name).GetFullPath();
     unlink(Native(temporary).c_str());
-    if (!CopyFileTo(file, temporary, error))
+    if (!CopyFileTo(file, temporary, error, true)) // the source is unlinked next
         return false;
     for (int attempt = 1; attempt < 10000; ++attempt)
     {

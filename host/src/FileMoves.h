@@ -10,8 +10,9 @@
 bool MoveIntoDirectory(const wxString& file, const wxString& directory, const wxString& name,
                        wxString& finalPath, wxString& error);
 
-// Copies file to target (target must not exist); the copy is synced.
-bool CopyFileTo(const wxString& file, const wxString& target, wxString& error);
+// Copies file to target (target must not exist). With sync the copy is on
+// disk before this returns: needed only when the source goes away next.
+bool CopyFileTo(const wxString& file, const wxString& target, wxString& error, bool sync = false);
 
 // Creates directory and its missing parents.
 bool MakeDirectories(const wxString& directory, wxString& error);
