@@ -1,5 +1,7 @@
 #include "PageSizePanelWithoutMerge.h"
 
+#include <algorithm>
+
 #include <wx/combobox.h>
 #include <wx/valgen.h>
 
@@ -34,6 +36,9 @@ bool PageSizePanelWithoutMerge::InitializeControls()
     {
         if (!m_arrPageSizeNames.empty())
             paper->Append(m_arrPageSizeNames);
+        // At least its 150 pixels, wider when the server's names need it.
+        paper->InvalidateBestSize();
+        paper->SetMinSize(wxSize(std::max(150, paper->GetBestSize().x), -1));
         paper->SetValidator(wxGenericValidator(&m_strPageSize));
     }
     if (wxWindow* position = FindWindow(ID_IMAGEPOSITION_COMBO))

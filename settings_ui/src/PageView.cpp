@@ -14,6 +14,8 @@ wxSizer* CreatePageViewEPS(wxWindow* parent, bool, bool)
     auto* box = new wxStaticBoxSizer(wxVERTICAL, parent, TranslateUiText("Page"));
     ApplyDefaultTheme(box->GetStaticBox());
     auto* grid = new wxFlexGridSizer(3, 5, 10);
+    // Paper names can be long: the lists take the width the section has.
+    grid->AddGrowableCol(1);
 
     grid->Add(new wxStaticText(parent, ID_PAGESIZE_LABEL, TranslateUiText("Size:")), 0,
               wxALIGN_CENTER_VERTICAL);
@@ -33,6 +35,6 @@ wxSizer* CreatePageViewEPS(wxWindow* parent, bool, bool)
               0, wxEXPAND);
     grid->AddSpacer(0);
 
-    box->Add(grid, 0, wxALL, 5);
+    box->Add(grid, 0, wxEXPAND | wxALL, 5);
     return box;
 }

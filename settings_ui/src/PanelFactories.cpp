@@ -60,6 +60,8 @@ wxWindow* ImageSizePanelWithoutMerge_Factory::CreateInstance(wxWindow* parent,
     panel->SetSizer(sizer);
     sizer->SetSizeHints(panel);
     panel->InitializeControls();
+    // The paper list knows its names only now.
+    sizer->SetSizeHints(panel);
     panel->TransferDataToWindow();
     return panel;
 }

@@ -7,6 +7,9 @@
 #include <wx/image.h>
 #include <wx/sizer.h>
 #include <wx/stopwatch.h>
+#include <wx/timer.h>
+
+#include <vector>
 
 #include <hotfolder/HFTranslations.h>
 
@@ -28,20 +31,20 @@ void Pump(int milliseconds)
     }
 }
 
-// Reads back what the display shows of the window.
-bool SaveWindow(wxWindow* window, const wxString& path)
+// Reads back what the display shows of the windows, in one snapshot: the
+// screen device keeps the first picture it took.
+bool SaveWindows(const std::vector<std::pair<wxWindow*, wxString>>& shots)
 {
-    window->Raise();
-    window->Refresh();
-    window->Update();
-    Pump(400);
-    const wxRect rect = window->GetScreenRect();
-    wxBitmap bitmap(rect.GetSize());
-    wxMemoryDC memory(bitmap);
     wxScreenDC screen;
-    memory.Blit(0, 0, rect.width, rect.height, &screen, rect.x, rect.y);
+    const wxSize size = screen.GetSize();
+    wxBitmap whole(size);
+    wxMemoryDC memory(whole);
+    memory.Blit(0, 0, size.x, size.y, &screen, 0, 0);
     memory.SelectObject(wxNullBitmap);
-    return bitmap.SaveFile(path, wxBITMAP_TYPE_PNG);
+    bool ok = true;
+    for (const auto& [window, path] : shots)
+        ok = whole.GetSubBitmap(window->GetScreenRect()).SaveFile(path, wxBITMAP_TYPE_PNG) && ok;
+    return ok;
 }
 
 wxString ReadFile(const wxString& path)
@@ -87,15 +90,26 @@ public:
         sizer->Add(panel, 1, wxEXPAND);
         frame->SetSizerAndFit(sizer);
         frame->Show();
-        m_ok = SaveWindow(panel, directory + "/settings-panel-" + language + ".png");
 
         bool heightIsLength = false;
         auto* dialog = new CustomPageSizeDlg(
-            frame, wxID_ANY, HFTranslations::GetInstance()->Translate("Custom page size"), 1, 13.89,
-            1, 19.44, 8.5, 11, UNIT_INCH, heightIsLength);
-        dialog->Move(0, 0);
-        dialog->Show();
-        m_ok = SaveWindow(dialog, directory + "/custom-page-size-" + language + ".png") && m_ok;
+            nullptr, wxID_ANY, HFTranslations::GetInstance()->Translate("Custom page size"), 1,
+            13.89, 1, 19.44, 8.5, 11, UNIT_INCH, heightIsLength);
+        // Beside the frame: without a window manager nothing stacks them.
+        dialog->Move(frame->GetSize().x + 20, 0);
+        // A dialog is drawn for sure only inside its own modal loop.
+        wxTimer timer;
+        timer.Bind(wxEVT_TIMER,
+                   [&](wxTimerEvent&)
+                   {
+                       Pump(500);
+                       m_ok = SaveWindows(
+                           {{panel, directory + "/settings-panel-" + language + ".png"},
+                            {dialog, directory + "/custom-page-size-" + language + ".png"}});
+                       dialog->EndModal(wxID_OK);
+                   });
+        timer.StartOnce(500);
+        dialog->ShowModal();
         dialog->Destroy();
         frame->Destroy();
         return true;
