@@ -2,6 +2,7 @@
 // controls, save, and compare everything written.
 #include <wx/msgdlg.h>
 #include <wx/testing.h>
+#include <wx/uiaction.h>
 
 #include "CustomPageSizeDlg.h"
 #include "PanelTestFixture.h"
@@ -328,4 +329,45 @@ TEST_F(SettingsPanel, DisabledFilterShowsHeaderAndInputTypeOnlyAndTouchesNoKey)
     EXPECT_TRUE(m_panel->LoadUISettings(settings));
     EXPECT_TRUE(Save(settings));
     EXPECT_EQ((Keys{{"OUTPUTFILETYPEEPS", "0"}}), Sorted(settings));
+}
+
+TEST_F(SettingsPanel, TabOrderFollowsTheLayout)
+{
+    Build();
+    MapPropToValue settings;
+    settings["OUTPUTFILETYPEEPS"] = "0";
+    settings["ORIGINALSIZE"] = "0";
+    settings["CUSTOMSIZE"] = "1";
+    settings["CONTRAINPROPORTION"] = "0";
+    m_panel->LoadUISettings(settings);
+
+    // The toolkit tabs through the panel's children in list order.
+    std::vector<int> order;
+    for (wxWindow* child : m_panel->GetChildren())
+        if (child->GetId() >= ID_PAGESIZE_COMBO && child->GetId() <= ID_OUTPUT_EPS_RADIO)
+            order.push_back(child->GetId());
+    const std::vector<int> expected = {
+        ID_ORIGINALSIZE_RADIO,    ID_CUSTOMSIZE_RADIO,    ID_CONSTRAIN_CHECK,
+        ID_WIDTH_RADIO,           ID_WIDTH_TEXT,          ID_WIDTH_UNIT_COMBO,
+        ID_HEIGHT_RADIO,          ID_HEIGHT_TEXT,         ID_HEIGHT_UNIT_COMBO,
+        ID_AUTOSCALE_RADIO,       ID_FITTOPAGE_RADIO,     ID_SHRINKTOFIT_RADIO,
+        ID_SCALETOPRINT_CHECK,    ID_PAGESIZE_LABEL,      ID_PAGESIZE_COMBO,
+        ID_CUSTOMPAGESIZE_BUTTON, ID_IMAGEPOSITION_LABEL, ID_IMAGEPOSITION_COMBO,
+        ID_OUTPUT_EPS_RADIO,      ID_OUTPUT_PS_RADIO};
+    EXPECT_EQ(expected, order);
+
+    // One real Tab: from the width field to its unit list.
+    wxTextCtrl* width = Text(ID_WIDTH_TEXT);
+    width->SetFocus();
+    for (int i = 0; i < 40 && wxWindow::FindFocus() != width; ++i)
+        Pump(25);
+    if (wxWindow::FindFocus() != width)
+        GTEST_SKIP() << "the display gives no keyboard focus";
+    wxUIActionSimulator().Char(WXK_TAB);
+    Pump(200);
+    wxWindow* focus = wxWindow::FindFocus();
+    ASSERT_NE(nullptr, focus);
+    EXPECT_TRUE(focus == Combo(ID_WIDTH_UNIT_COMBO) ||
+                focus->GetParent() == Combo(ID_WIDTH_UNIT_COMBO))
+        << focus->GetId();
 }
