@@ -70,7 +70,7 @@ bool ParseArgs(const std::vector<std::string>& args, const std::vector<OptionSpe
                 parsed.Add(spec->name, args[++i]);
             if (parsed.All(spec->name).empty())
             {
-                error = spec->name + " needs at least one KEY=VALUE";
+                error = name + " needs at least one KEY=VALUE";
                 return false;
             }
         }
@@ -82,7 +82,7 @@ bool ParseArgs(const std::vector<std::string>& args, const std::vector<OptionSpe
                 parsed.Add(spec->name, args[++i]);
             else
             {
-                error = spec->name + " needs a value";
+                error = name + " needs a value";
                 return false;
             }
         }
@@ -90,7 +90,7 @@ bool ParseArgs(const std::vector<std::string>& args, const std::vector<OptionSpe
         {
             if (hasInlineValue)
             {
-                error = spec->name + " takes no value";
+                error = name + " takes no value";
                 return false;
             }
             parsed.Mark(spec->name);
