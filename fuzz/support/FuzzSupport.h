@@ -1,0 +1,43 @@
+#pragma once
+// What every fuzz entry point shares: a toolkit initialised once with its
+// log silenced, a private scratch directory the configuration readers are
+// pointed at, and a hard stop when a reader breaks one of its promises.
+#include <cstddef>
+#include <cstdint>
+#include <string>
+
+#include <wx/string.h>
+
+// Stops the run (libFuzzer keeps the input) when a documented promise of the
+// code under test does not hold.
+#define FUZZ_REQUIRE(condition)                                                                    \
+    do                                                                                             \
+    {                                                                                              \
+        if (!(condition))                                                                          \
+            fuzzsupport::Fail(#condition, __FILE__, __LINE__);                                     \
+    } while (false)
+
+namespace fuzzsupport
+{
+[[noreturn]] void Fail(const char* condition, const char* file, int line);
+
+// Sets up the toolkit and the scratch directory; later calls do nothing.
+void InitialiseOnce();
+
+// The process's scratch directory, without a trailing '/'. Holds
+// "HotFolders" (HOTFOLDER_WAREHOUSE_ROOT points here) and "Resources"
+// (HOTFOLDER_RESOURCES_DIR points there).
+const std::string& ScratchDirectory();
+std::string WarehouseDirectory();
+std::string ResourcesDirectory();
+
+// Replaces the file with exactly these bytes; the path is returned.
+std::string WriteScratchFile(const std::string& path, const uint8_t* data, size_t size);
+
+// The bytes as text the way the client receives them: UTF-8 when they are
+// valid UTF-8, else one character per byte, so no input is lost as empty.
+wxString TextOf(const uint8_t* data, size_t size);
+} // namespace fuzzsupport
+
+extern "C" int LLVMFuzzerInitialize(int* argc, char*** argv);
+extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size);
