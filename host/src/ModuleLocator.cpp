@@ -16,6 +16,19 @@ static wxString ExecutableDirectory()
     return wxFileName(wxString(buffer, *wxConvFileName)).GetPath();
 }
 
+static wxString ModuleBelow(const wxString& executableDirectory, const wxString& libDirectory)
+{
+    wxFileName module(executableDirectory, "EPS.so");
+    module.AppendDir("..");
+    for (const wxString& part : wxSplit(libDirectory, '/'))
+        if (!part.empty())
+            module.AppendDir(part);
+    module.AppendDir("hotfolder");
+    module.AppendDir("filters");
+    module.Normalize(wxPATH_NORM_DOTS | wxPATH_NORM_ABSOLUTE);
+    return module.GetFullPath();
+}
+
 wxString LocateFilterModule(const wxString& explicitPath)
 {
     if (!explicitPath.empty())
@@ -23,11 +36,15 @@ wxString LocateFilterModule(const wxString& explicitPath)
     if (const char* fromEnvironment = std::getenv("HOTFOLDER_MODULE"))
         if (*fromEnvironment)
             return wxString(fromEnvironment, *wxConvFileName);
-    wxFileName module(ExecutableDirectory(), "EPS.so");
-    module.AppendDir("..");
-    module.AppendDir("lib");
-    module.AppendDir("hotfolder");
-    module.AppendDir("filters");
-    module.Normalize(wxPATH_NORM_DOTS | wxPATH_NORM_ABSOLUTE);
-    return module.GetFullPath();
+    const wxString directory = ExecutableDirectory();
+    const wxString usual = ModuleBelow(directory, "lib");
+#ifdef HF_INSTALLED_LIBDIR
+    if (!wxFileName::FileExists(usual))
+    {
+        const wxString installed = ModuleBelow(directory, HF_INSTALLED_LIBDIR);
+        if (wxFileName::FileExists(installed))
+            return installed;
+    }
+#endif
+    return usual;
 }
