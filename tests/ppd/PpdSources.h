@@ -1,0 +1,61 @@
+#pragma once
+// Printer descriptions to test with: the one written for the tests, the
+// generic PostScript printer that CUPS compiles from its sample driver, and
+// a spread of HP PostScript printers from Debian's HP PPD archive.
+#include <string>
+#include <vector>
+
+#include <unistd.h>
+
+#include "GhostscriptOracle.h"
+
+namespace ppd_sources
+{
+inline const char* const kSampleDriver = "/usr/share/cups/drv/sample.drv";
+inline const char* const kHpArchive = "/usr/lib/cups/driver/postscript-hp";
+
+inline std::string TestPpd()
+{
+    return std::string(HF_TEST_DATA_DIR) + "/ppd/test-postscript.ppd";
+}
+
+// "" when CUPS's PPD compiler or its sample driver is not installed.
+inline std::string GenericPostScriptPpd(const std::string& dir)
+{
+    if (!hf_test::ProgramAvailable("ppdc") || access(kSampleDriver, R_OK) != 0)
+        return std::string();
+    const auto run = hf_test::RunProgram({"ppdc", "-d", dir, kSampleDriver});
+    const std::string path = dir + "/generic.ppd";
+    return run.exitCode == 0 && access(path.c_str(), R_OK) == 0 ? path : std::string();
+}
+
+// Up to count HP descriptions spread over the archive's list; empty when
+// the archive is not installed.
+inline std::vector<std::string> HpPpds(const std::string& dir, size_t count)
+{
+    std::vector<std::string> paths;
+    if (access(kHpArchive, X_OK) != 0)
+        return paths;
+    const auto list = hf_test::RunProgram({kHpArchive, "list"});
+    std::vector<std::string> uris;
+    std::istringstream lines(list.out);
+    for (std::string line; std::getline(lines, line);)
+    {
+        // "postscript-hp:0/ppd/hplip/HP/hp-....ppd" en "HP" ...
+        if (line.rfind("\"postscript-hp:0/", 0) != 0)
+            continue;
+        uris.push_back(line.substr(1, line.find('"', 1) - 1));
+    }
+    for (size_t i = 0; i < count && !uris.empty(); ++i)
+    {
+        const std::string& uri = uris[i * uris.size() / count];
+        const auto extracted = hf_test::RunProgram({kHpArchive, "cat", uri});
+        if (extracted.exitCode != 0 || extracted.out.empty())
+            continue;
+        const std::string path = dir + "/" + uri.substr(uri.find_last_of('/') + 1);
+        std::ofstream(path, std::ios::binary) << extracted.out;
+        paths.push_back(path);
+    }
+    return paths;
+}
+} // namespace ppd_sources
