@@ -202,6 +202,12 @@ int RunRunCommand(const Arguments& args)
     }
     else
         places.outputFolder = folder.GetDefaultOutputFolder();
+    if (wxFileName::DirName(places.outputFolder).SameAs(wxFileName::DirName(folder.GetFolder())))
+    {
+        // Outputs would be offered to the filter again as new arrivals.
+        PrintError("the output directory cannot be the hot folder itself");
+        return kExitUsage;
+    }
     if (!EnsureWritableDirectory(places.outputFolder, error))
     {
         PrintError("unusable output directory: " + error);

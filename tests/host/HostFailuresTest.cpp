@@ -90,5 +90,8 @@ TEST_F(HostFailureTest, ABadCommandLineIsAUsageError)
     EXPECT_NE(run.err.find("unknown option --bogus"), std::string::npos);
     EXPECT_EQ(Host({"frobnicate"}).exitCode, 2);
     EXPECT_EQ(Host({"run", folder, "--settle", "soon"}).exitCode, 2);
+    hf_test::ProcessResult intoItself = Host({"run", folder, "--out", folder + "/"});
+    EXPECT_EQ(intoItself.exitCode, 2);
+    EXPECT_NE(intoItself.err.find("cannot be the hot folder itself"), std::string::npos);
     EXPECT_EQ(ReadFile(folder + "/label.eps"), original);
 }
