@@ -28,15 +28,20 @@ std::string OpenError(const std::string& path)
     return text;
 }
 
+// The standard name of the keyword, unless the printer uses that keyword
+// for another size ("Postcard" is not always the Japanese one): then the
+// name of the size itself.
 std::string PwgNameOf(const char* keyword, double width, double height)
 {
-    if (pwg_media_t* media = pwgMediaForPPD(keyword))
-        if (media->pwg)
-            return media->pwg;
-    if (pwg_media_t* media = pwgMediaForSize(PWG_FROM_POINTS(width), PWG_FROM_POINTS(height)))
-        if (media->pwg)
-            return media->pwg;
-    return std::string();
+    const int pwgWidth = PWG_FROM_POINTS(width);
+    const int pwgLength = PWG_FROM_POINTS(height);
+    const int onePoint = PWG_FROM_POINTS(1);
+    pwg_media_t* media = pwgMediaForPPD(keyword);
+    if (media && media->pwg && std::abs(media->width - pwgWidth) <= onePoint &&
+        std::abs(media->length - pwgLength) <= onePoint)
+        return media->pwg;
+    media = pwgMediaForSize(pwgWidth, pwgLength);
+    return media && media->pwg ? media->pwg : std::string();
 }
 
 // "600dpi" and "600x1200dpi" both give the first number.

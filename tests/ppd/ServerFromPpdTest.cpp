@@ -31,6 +31,24 @@ std::string Utf8(const wxString& text)
     return std::string(text.utf8_str());
 }
 
+// A standard media name ends in its size: "iso_a4_210x297mm",
+// "na_letter_8.5x11in". Width and height in points; false for other names.
+bool SizeOfMediaName(const wxString& name, double& width, double& height)
+{
+    const wxString size = name.AfterLast('_');
+    double perUnit = 0;
+    if (size.EndsWith("mm"))
+        perUnit = 72 / 25.4;
+    else if (size.EndsWith("in"))
+        perUnit = 72;
+    if (perUnit == 0 || !size.BeforeFirst('x').ToCDouble(&width) ||
+        !size.AfterFirst('x').Left(size.AfterFirst('x').length() - 2).ToCDouble(&height))
+        return false;
+    width *= perUnit;
+    height *= perUnit;
+    return true;
+}
+
 // Everything the description says about papers and custom sizes, checked
 // against the PPD text.
 void ExpectDescriptionMatches(const std::string& ppdPath)
@@ -69,6 +87,11 @@ void ExpectDescriptionMatches(const std::string& ppdPath)
             EXPECT_NEAR(sheet.Bottom, paper.ury, 1e-3);
         }
         EXPECT_EQ(Trimmed(Utf8(sheet.PSCommand)), Trimmed(paper.code));
+        // The standard name given as alias is one of this size.
+        double aliasWidth = 0, aliasHeight = 0;
+        ASSERT_TRUE(SizeOfMediaName(sheet.PaperAlias, aliasWidth, aliasHeight)) << sheet.PaperAlias;
+        EXPECT_NEAR(aliasWidth, paper.width, 2) << sheet.PaperAlias;
+        EXPECT_NEAR(aliasHeight, paper.height, 2) << sheet.PaperAlias;
         if (paper.keyword == "A4")
         {
             EXPECT_EQ(sheet.PaperAlias, "iso_a4_210x297mm");
