@@ -18,6 +18,7 @@ public:
     wxString GetOutputFormatForFilter(const wxString& filter, const wxString& defaultFormat) const;
 
 private:
-    wxXmlNode m_FilterSettingNode;
+    // wxXmlNode() leaves the node type unset; an empty element reads as "no node".
+    wxXmlNode m_FilterSettingNode{wxXML_ELEMENT_NODE, wxString()};
 };
 } // namespace db
