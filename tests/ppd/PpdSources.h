@@ -2,6 +2,8 @@
 // Printer descriptions to test with: the one written for the tests, the
 // generic PostScript printer that CUPS compiles from its sample driver, and
 // a spread of HP PostScript printers from Debian's HP PPD archive.
+#include <fstream>
+#include <sstream>
 #include <string>
 #include <vector>
 
