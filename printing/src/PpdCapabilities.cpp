@@ -69,6 +69,13 @@ void ReadCustomSize(ppd_file_t* ppd, PpdCustomSize& custom)
     custom.right = ppd->custom_margins[2];
     custom.top = ppd->custom_margins[3];
     custom.command = code->value ? code->value : "";
+    // The filter puts the size's operands straight in front of this code,
+    // so it must start with a blank. A space, not the PPD's line break: an
+    // XML reader drops a text's leading line break as white-space-only data.
+    const size_t codeStart = custom.command.find_first_not_of(" \t\r\n");
+    custom.command.erase(0, codeStart == std::string::npos ? custom.command.size() : codeStart);
+    if (!custom.command.empty())
+        custom.command.insert(0, " ");
 }
 } // namespace
 

@@ -3,7 +3,8 @@
 #include <dlfcn.h>
 
 #include <algorithm>
-#include <charconv>
+#include <cmath>
+#include <cstdio>
 
 #include <gtest/gtest.h>
 #include <hotfolder/HFPlugin.h>
@@ -13,6 +14,8 @@
 #include "GhostscriptOracle.h"
 #include "PpdSources.h"
 #include "SampleEps.h"
+#include "CupsJobOptions.h"
+#include "PageSizeKeys.h"
 #include "ServerFromPpd.h"
 #include "db/ConfigurationReader.h"
 #include "db/FilterConfiguration.h"
@@ -26,13 +29,6 @@
 
 namespace
 {
-wxString Points(double value)
-{
-    char text[64];
-    const auto end = std::to_chars(text, text + sizeof text, value).ptr;
-    return wxString::FromAscii(text, end - text);
-}
-
 void AddSetting(wxXmlNode* ui, const wxString& key, const wxString& value)
 {
     auto* node = new wxXmlNode(wxXML_ELEMENT_NODE, key);
@@ -77,10 +73,11 @@ protected:
             dlclose(module);
     }
 
-    // The settings a folder has after the user picked this paper. A filter
-    // object keeps the first page command it is given, so every paper gets
-    // a fresh one, as a host does per folder.
-    void ChoosePaper(const wxString& server, const stPageAttribute& sheet)
+    // The settings a folder has after the user picked a page, written by
+    // the settings panel's own key writers. A filter object keeps the first
+    // page command it is given, so every page gets a fresh one, as a host
+    // does per folder.
+    void LoadSettings(const wxString& server, const MapPropToValue& page)
     {
         if (plugin)
             release(plugin);
@@ -92,22 +89,22 @@ protected:
         filter.AddChild(ui);
         AddSetting(ui, "OUTPUTFILETYPEEPS", "0");
         AddSetting(ui, "ORIGINALSIZE", "1");
-        AddSetting(ui, "DEFAULTPAGESIZE", sheet.PaperName);
-        AddSetting(ui, "PAGESIZE_COMMAND", sheet.PSCommand);
-        AddSetting(ui, "FORCEPAGESIZEX", Points(sheet.Width));
-        AddSetting(ui, "FORCEPAGESIZEY", Points(sheet.Height));
-        AddSetting(ui, "IMAGEEABLESIZELLX", Points(sheet.Left));
-        AddSetting(ui, "IMAGEEABLESIZELLY", Points(sheet.Top));
-        AddSetting(ui, "IMAGEEABLESIZEURX", Points(sheet.Right));
-        AddSetting(ui, "IMAGEEABLESIZEURY", Points(sheet.Bottom));
         AddSetting(ui, "IMAGEPOSITION", "Center");
+        for (auto it = page.begin(); it != page.end(); ++it)
+            AddSetting(ui, it->first, it->second);
         ASSERT_EQ(plugin->InitilaizeFromPreference(&filter), 0);
     }
 
-    void ExpectPrintsOnPaper(const wxString& server, const stPageAttribute& sheet)
+    struct Outcome
     {
-        SCOPED_TRACE(std::string(sheet.PaperName.utf8_str()));
-        ChoosePaper(server, sheet);
+        hf_test::GhostscriptReport gs;
+        printing::OptionList cupsOptions; // the job overrides as CUPS options
+    };
+
+    // Converts a small artwork with the loaded settings; command tells the
+    // printer-side stand-ins Ghostscript needs.
+    void Convert(const wxString& command, Outcome& outcome)
+    {
         sample::ScratchDir hot, out;
         ASSERT_TRUE(sample::WriteFile(hot.File("art.eps"), sample::RectangleEps(0, 0, 72, 36)));
         db::Setting setting;
@@ -125,8 +122,27 @@ protected:
         ASSERT_EQ(jobs.GetCount(), 1u);
         wxString outputName;
         ASSERT_EQ(plugin->Process("", jobs[0], out.Path(), outputName, nullptr), 0);
+        outcome.gs = RunOnPrinter(out.File(outputName), command);
 
-        const auto gs = RunOnPrinter(out.File(outputName), sheet.PSCommand);
+        db::JobConfiguration overrides;
+        db::ConfigurationReader::ReadJobConfiguration(out.File("Folder.cfg"), overrides);
+        printing::OptionList pairs;
+        for (const auto& [key, property] : overrides.GetProperties())
+            pairs.emplace_back(std::string(key.utf8_str()),
+                               std::string(property.GetValue().utf8_str()));
+        outcome.cupsOptions = printing::CupsOptionsFromOverrides(pairs);
+    }
+
+    void ExpectPrintsOnPaper(const wxString& server, const stPageAttribute& sheet)
+    {
+        SCOPED_TRACE(std::string(sheet.PaperName.utf8_str()));
+        MapPropToValue page;
+        page["DEFAULTPAGESIZE"] = sheet.PaperName;
+        WriteSheetPageKeys(page, sheet);
+        LoadSettings(server, page);
+        Outcome outcome;
+        Convert(sheet.PSCommand, outcome);
+        const auto& gs = outcome.gs;
         EXPECT_FALSE(gs.postscriptError) << gs.process.err;
         ASSERT_TRUE(gs.pageSeen && gs.marked) << gs.process.out << gs.process.err;
         EXPECT_EQ(gs.pages, 1);
@@ -137,12 +153,9 @@ protected:
         EXPECT_GE(gs.marks.lly, sheet.Top - 1);
         EXPECT_LE(gs.marks.urx, sheet.Right + 1);
         EXPECT_LE(gs.marks.ury, sheet.Bottom + 1);
-
-        // The paper goes on to the print server as the job's page size.
-        db::JobConfiguration overrides;
-        db::ConfigurationReader::ReadJobConfiguration(out.File("Folder.cfg"), overrides);
-        ASSERT_EQ(overrides.GetProperties().count("PageSize"), 1u);
-        EXPECT_EQ(overrides.GetProperties().at("PageSize").GetValue(), sheet.PaperName);
+        // The paper goes on to CUPS as the job's page size.
+        EXPECT_EQ(outcome.cupsOptions,
+                  (printing::OptionList{{"PageSize", std::string(sheet.PaperName.utf8_str())}}));
     }
 
     // Converts on the named papers (all when names is empty); returns how
@@ -196,4 +209,43 @@ TEST_F(PaperConversion, HpPrinterPapers)
         GTEST_SKIP() << ppd_sources::kHpArchive << " missing";
     for (const std::string& ppd : ppds)
         EXPECT_GE(ConvertOnPapers(ppd, {"Letter", "A4", "Legal", "Executive", "A5"}), 2u);
+}
+
+// A custom size inside the printer's limits, set up as the custom page size
+// dialog does, runs through the printer's own custom size code.
+TEST_F(PaperConversion, CustomSizesThroughThePrintersOwnCode)
+{
+    sample::ScratchDir dir;
+    std::vector<std::string> ppds = {ppd_sources::TestPpd()};
+    for (const std::string& hp : ppd_sources::HpPpds(dir.Path().ToStdString(), 3))
+        ppds.push_back(hp);
+    size_t tried = 0;
+    for (const std::string& ppd : ppds)
+    {
+        SCOPED_TRACE(ppd);
+        wxString server;
+        std::string error;
+        ASSERT_TRUE(ServerDescriptionFromPpd(ppd, server, error)) << error;
+        stCustomPageSizeAttribute custom;
+        if (!PluginInitialize::InitializeCustomPageSizeInfo(server, custom))
+            continue;
+        const double width = std::floor((custom.MinMediaWidth + custom.MaxMediaWidth) / 2);
+        const double height = std::floor((custom.MinMediaHeight + custom.MaxMediaHeight) / 2);
+        MapPropToValue page;
+        page["DEFAULTPAGESIZE"] = "Custom";
+        WriteCustomPageKeys(page, width, height, custom, static_cast<Unit_t>(2));
+        LoadSettings(server, page);
+        Outcome outcome;
+        Convert(custom.command, outcome);
+        const auto& gs = outcome.gs;
+        EXPECT_FALSE(gs.postscriptError) << gs.process.err;
+        ASSERT_TRUE(gs.pageSeen) << gs.process.out << gs.process.err;
+        EXPECT_NEAR(gs.pageWidth, width, 1);
+        EXPECT_NEAR(gs.pageHeight, height, 1);
+        char expected[64];
+        std::snprintf(expected, sizeof expected, "Custom.%gx%g", width, height);
+        EXPECT_EQ(outcome.cupsOptions, (printing::OptionList{{"PageSize", expected}}));
+        ++tried;
+    }
+    EXPECT_GE(tried, 1u);
 }

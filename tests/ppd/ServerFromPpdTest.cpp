@@ -127,6 +127,8 @@ void ExpectDescriptionMatches(const std::string& ppdPath)
         EXPECT_EQ(custom.RightHWMargin, std::ceil(ppd.margins[2]));
         EXPECT_EQ(custom.TopHWMargin, std::ceil(ppd.margins[3]));
         EXPECT_EQ(Trimmed(Utf8(custom.command)), Trimmed(ppd.customCode));
+        // The filter writes the size's operands right in front of the code.
+        EXPECT_TRUE(custom.command.StartsWith(" ")) << custom.command;
         EXPECT_FALSE(custom.SubstrateHeightToLength);
     }
 
