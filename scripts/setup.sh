@@ -10,6 +10,8 @@ packages=(
   xvfb xauth x11-utils libxml2-utils
   locales python3
   clang libclang-rt-14-dev
+  libcups2-dev cups-daemon cups-client cups-core-drivers cups-ppdc
+  printer-driver-postscript-hp dpkg-dev
 )
 
 missing=()
