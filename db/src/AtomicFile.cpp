@@ -76,6 +76,36 @@ int CreateTempBeside(const std::string& target, std::string& tempPath)
     return -1;
 }
 
+// XML 1.0 has no way to carry most C0 controls, U+FFFE, U+FFFF or surrogate
+// code points, and wxXmlDocument writes them raw; a file holding one would
+// never load again. In UTF-8 the controls are single bytes that never occur
+// inside a multi-byte sequence, so they can be dropped byte by byte.
+void DropCharactersXmlCannotHold(std::string& bytes)
+{
+    std::string kept;
+    kept.reserve(bytes.size());
+    for (size_t i = 0; i < bytes.size(); ++i)
+    {
+        const unsigned char c = static_cast<unsigned char>(bytes[i]);
+        if (c < 0x20 && c != '\t' && c != '\n' && c != '\r')
+            continue;
+        if (i + 2 < bytes.size())
+        {
+            const unsigned char c1 = static_cast<unsigned char>(bytes[i + 1]);
+            const unsigned char c2 = static_cast<unsigned char>(bytes[i + 2]);
+            const bool nonCharacter = c == 0xEF && c1 == 0xBF && (c2 == 0xBE || c2 == 0xBF);
+            const bool surrogate = c == 0xED && c1 >= 0xA0;
+            if (nonCharacter || surrogate)
+            {
+                i += 2;
+                continue;
+            }
+        }
+        kept.push_back(static_cast<char>(c));
+    }
+    bytes.swap(kept);
+}
+
 void SyncDirectory(const std::string& directory)
 {
     const int fd = ::open(directory.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
@@ -137,6 +167,7 @@ bool AtomicFile::WriteXml(const wxString& path, const wxXmlDocument& document, i
     std::string bytes(length, '\0');
     if (length > 0)
         stream.CopyTo(&bytes[0], length);
+    DropCharactersXmlCannotHold(bytes);
     return Write(path, bytes);
 }
 } // namespace db

@@ -261,3 +261,20 @@ TEST(FolderFileFormat, WrittenAndReadBackEveryField)
     ASSERT_EQ(flipped.Write(dir.wx("Folder.cfg")), 0);
     ExpectSameConfig(ReadAll(dir.wx("Folder.cfg")), flipped);
 }
+
+TEST(FolderFileFormat, CharactersXmlCannotCarryAreLeftOutSoTheFileStillLoads)
+{
+    TempDir dir;
+    FolderConfig config = FullFolderConfig();
+    config.setting.SetDescription(wxString("a") + wxUniChar(0x01) + "b" + wxUniChar(0x1F) +
+                                  wxUniChar(0xFFFE) + wxUniChar(0xFFFF) +
+                                  wxString::FromUTF8("c\t\xc3\xa4") + wxUniChar(0x10000));
+    config.job.SaveProperty(wxString("Key") + wxUniChar(0x0B), "v", "v", "v");
+    ASSERT_EQ(config.Write(dir.wx("Folder.cfg")), 0);
+    FolderConfig read = ReadAll(dir.wx("Folder.cfg"));
+    EXPECT_EQ(read.setting.GetDescription(),
+              wxString::FromUTF8("abc\t\xc3\xa4") +
+                  wxUniChar(0x10000)); // tab, non-ASCII and astral kept
+    EXPECT_EQ(read.job.GetProperties().count("Key"), 1u);
+    EXPECT_EQ(read.setting.GetServerName(), config.setting.GetServerName());
+}

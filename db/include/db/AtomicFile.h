@@ -18,7 +18,9 @@ public:
     static bool Write(const wxString& path, const void* data, size_t size);
     static bool Write(const wxString& path, const std::string& bytes);
     // Serialises the document ("UTF-8" unless the document says otherwise)
-    // with the given indentation step and writes it as above.
+    // with the given indentation step and writes it as above. Characters
+    // XML cannot carry (most control characters, U+FFFE, U+FFFF) are left
+    // out, so the file always loads again.
     static bool WriteXml(const wxString& path, const wxXmlDocument& document, int indent = 2);
 };
 } // namespace db
