@@ -6,6 +6,7 @@
 #include <ctime>
 #include <string>
 
+#include <dirent.h>
 #include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -55,13 +56,18 @@ std::string DirectoryOf(const std::string& path)
     return path.substr(0, slash);
 }
 
+std::string BaseName(const std::string& path)
+{
+    const size_t slash = path.rfind('/');
+    return slash == std::string::npos ? path : path.substr(slash + 1);
+}
+
 // O_EXCL with a fresh random suffix: the temp file is ours alone, and its
 // mode is 0666 less the umask like any newly created file.
 int CreateTempBeside(const std::string& target, std::string& tempPath)
 {
     const std::string directory = DirectoryOf(target);
-    const size_t slash = target.rfind('/');
-    const std::string base = slash == std::string::npos ? target : target.substr(slash + 1);
+    const std::string base = BaseName(target);
     static thread_local unsigned seed =
         static_cast<unsigned>(::getpid()) ^ static_cast<unsigned>(::time(nullptr));
     for (int attempt = 0; attempt < 100; ++attempt)
@@ -106,6 +112,30 @@ void DropCharactersXmlCannotHold(std::string& bytes)
     bytes.swap(kept);
 }
 
+// Temp files of writers that were killed before their rename. Only those
+// untouched for a long time go: a live writer's file is never that old.
+void RemoveStaleTempFiles(const std::string& directory, const std::string& base)
+{
+    const std::string prefix = "." + base + ".";
+    const size_t expectedLength = prefix.size() + 8 + 4; // 8 hex digits, ".tmp"
+    DIR* dir = ::opendir(directory.c_str());
+    if (!dir)
+        return;
+    const time_t cutoff = ::time(nullptr) - 15 * 60;
+    while (const dirent* entry = ::readdir(dir))
+    {
+        const std::string name = entry->d_name;
+        if (name.size() != expectedLength || name.compare(0, prefix.size(), prefix) != 0 ||
+            name.compare(name.size() - 4, 4, ".tmp") != 0)
+            continue;
+        const std::string path = directory + "/" + name;
+        struct stat info;
+        if (::lstat(path.c_str(), &info) == 0 && S_ISREG(info.st_mode) && info.st_mtime < cutoff)
+            ::unlink(path.c_str());
+    }
+    ::closedir(dir);
+}
+
 void SyncDirectory(const std::string& directory)
 {
     const int fd = ::open(directory.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
@@ -148,6 +178,7 @@ bool AtomicFile::Write(const wxString& path, const void* data, size_t size)
         return false;
     }
     SyncDirectory(DirectoryOf(target));
+    RemoveStaleTempFiles(DirectoryOf(target), BaseName(target));
     return true;
 }
 

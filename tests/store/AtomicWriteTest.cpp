@@ -7,6 +7,7 @@
 #include <random>
 
 #include <signal.h>
+#include <fcntl.h>
 #include <sys/stat.h>
 #include <sys/wait.h>
 #include <time.h>
@@ -139,4 +140,19 @@ TEST(AtomicWrite, FailedWriteLeavesNoTemporaryFileBehind)
     ASSERT_EQ(storetest::Run({"ls", "-A", dir.path()}, &listing), 0);
     EXPECT_EQ(listing, "Folder.cfg\n");
     EXPECT_FALSE(db::AtomicFile::Write(dir.wx("missing-dir/Folder.cfg"), std::string("x")));
+}
+
+TEST(AtomicWrite, TempFilesOfKilledWritersAreRemovedOnceStale)
+{
+    TempDir dir;
+    WriteFile(dir / ".Folder.cfg.0badf00d.tmp", "stale");
+    WriteFile(dir / ".Folder.cfg.12345678.tmp", "recent, maybe a live writer");
+    WriteFile(dir / ".Other.cfg.0badf00d.tmp", "another file's");
+    const timespec old[2] = {{time(nullptr) - 3600, 0}, {time(nullptr) - 3600, 0}};
+    for (const char* name : {".Folder.cfg.0badf00d.tmp", ".Other.cfg.0badf00d.tmp"})
+        ASSERT_EQ(utimensat(AT_FDCWD, (dir / name).c_str(), old, 0), 0);
+    ASSERT_TRUE(db::AtomicFile::Write(dir.wx("Folder.cfg"), std::string("x")));
+    std::string listing;
+    ASSERT_EQ(storetest::Run({"ls", "-A", dir.path()}, &listing), 0);
+    EXPECT_EQ(listing, ".Folder.cfg.12345678.tmp\n.Other.cfg.0badf00d.tmp\nFolder.cfg\n");
 }
