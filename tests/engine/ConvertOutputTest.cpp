@@ -67,7 +67,7 @@ protected:
         else
             EXPECT_EQ(converted, 1);
         EXPECT_TRUE(TakeFingerprint(input) == before) << "input changed";
-        const std::string bytes = ReadBytes(output);
+        const std::string bytes = ReadWholeFile(output);
         ExpectCrLfOutsideDocument(bytes, eps);
         return bytes;
     }
@@ -78,7 +78,7 @@ protected:
         const std::string path = kGoldenDir + goldenName;
         if (std::getenv("HF_UPDATE_GOLDEN"))
             WriteBytes(path, masked);
-        EXPECT_EQ(masked, ReadBytes(path)) << "differs from " << path;
+        EXPECT_EQ(masked, ReadWholeFile(path)) << "differs from " << path;
     }
 
     ScratchDir scratch;
@@ -243,21 +243,16 @@ TEST_F(ConvertOutput_, CommaLocaleStillWritesFullStops)
 TEST_F(ConvertOutput_, ShortCopyStillEndsWithTheTrailer)
 {
     // A DOS header whose section runs past the end of the file.
-    std::string body = FilledBoxEps(0, 0, 10, 10);
-    std::string header = "\xC5\xD0\xD3\xC6";
-    for (uint32_t value : {30u, 5000u, 0u, 0u, 0u, 0u})
-        for (int i = 0; i < 4; ++i)
-            header += static_cast<char>((value >> (8 * i)) & 0xFF);
-    header += "\xFF\xFF";
+    const std::string body = FilledBoxEps(0, 0, 10, 10);
     const std::string input = scratch.File("short.eps");
-    WriteBytes(input, header + body);
+    WriteBytes(input, DosEpsHeader(30, 5000) + body);
     StderrCapture capture;
     const int result = DetectAndConvert(input, NoParams(), scratch.File("out.ps"));
     const std::string messages = capture.Text();
     EXPECT_EQ(result, 1);
     EXPECT_EQ(messages, "Premature EOF with leftover BytesToRead = " +
                             std::to_string(5000 - body.size()) + "\n");
-    const std::string out = ReadBytes(scratch.File("out.ps"));
+    const std::string out = ReadWholeFile(scratch.File("out.ps"));
     const std::string trailer = "%%EndDocument\r\ncount @ST_count sub\r\n{ pop }\r\nrepeat\r\n"
                                 "countdictstack @ST_countdictstack sub\r\n{ end }\r\nrepeat\r\n"
                                 "@ST_save\r\nend\r\nrestore\r\nshowpage\r\n%%Trailer\r\n%%EOF\r\n";

@@ -11,10 +11,10 @@
 #include <cstdlib>
 #include <cstring>
 #include <fstream>
-#include <sstream>
 #include <string>
 
 #include "EPStoPS.h"
+#include "GhostscriptOracle.h"
 
 namespace hf_test
 {
@@ -56,14 +56,6 @@ inline void WriteBytes(const std::string& path, const std::string& bytes)
     out.write(bytes.data(), static_cast<std::streamsize>(bytes.size()));
 }
 
-inline std::string ReadBytes(const std::string& path)
-{
-    std::ifstream in(path, std::ios::binary);
-    std::ostringstream text;
-    text << in.rdbuf();
-    return text.str();
-}
-
 // Collects what is written to standard error while it lives.
 class StderrCapture
 {
@@ -98,7 +90,7 @@ private:
         close(m_saved);
         m_saved = -1;
         close(m_fd);
-        m_text = ReadBytes(m_name);
+        m_text = ReadWholeFile(m_name);
         unlink(m_name.c_str());
     }
     int m_fd = -1;
@@ -130,7 +122,7 @@ inline Fingerprint TakeFingerprint(const std::string& path)
     if (S_ISREG(info.st_mode))
     {
         unsigned long long hash = 1469598103934665603ULL; // FNV-1a
-        for (unsigned char c : ReadBytes(path))
+        for (unsigned char c : ReadWholeFile(path))
             hash = (hash ^ c) * 1099511628211ULL;
         print.hash = hash;
     }
@@ -172,6 +164,16 @@ inline std::string FilledBoxEps(double llx, double lly, double urx, double ury)
                   "%%%%EOF\n",
                   llx, lly, urx, ury, llx, lly, urx, lly, urx, ury, llx, ury);
     return text;
+}
+
+// The 30-byte DOS EPS binary header with the PostScript section's place.
+inline std::string DosEpsHeader(uint32_t offset, uint32_t length)
+{
+    std::string header = "\xC5\xD0\xD3\xC6";
+    for (uint32_t value : {offset, length, 0u, 0u, 0u, 0u})
+        for (int i = 0; i < 4; ++i)
+            header += static_cast<char>((value >> (8 * i)) & 0xFF);
+    return header + "\xFF\xFF"; // checksum
 }
 
 inline EPStoPSparams_t NoParams()

@@ -31,22 +31,23 @@ struct Copy
 class Extract_ : public ::testing::Test
 {
 protected:
-    Copy Run(const std::string& input, long offset, long length)
+    // Copies through the given streams and closes them; returns stderr.
+    static std::string Messages(FILE* inFile, FILE* outFile, long offset, long length)
     {
-        const std::string in = scratch.File("in.bin");
-        const std::string out = scratch.File("out.bin");
-        WriteBytes(in, input);
-        FILE* inFile = fopen(in.c_str(), "rb");
-        FILE* outFile = fopen(out.c_str(), "wb");
-        Copy copy;
-        {
-            StderrCapture capture;
-            ExtractEPSfromTIFFpreview(inFile, outFile, offset, length);
-            copy.messages = capture.Text();
-        }
+        StderrCapture capture;
+        ExtractEPSfromTIFFpreview(inFile, outFile, offset, length);
+        const std::string messages = capture.Text();
         fclose(inFile);
         fclose(outFile);
-        copy.output = ReadBytes(out);
+        return messages;
+    }
+    Copy Run(const std::string& input, long offset, long length)
+    {
+        WriteBytes(scratch.File("in.bin"), input);
+        Copy copy;
+        copy.messages = Messages(fopen(scratch.File("in.bin").c_str(), "rb"),
+                                 fopen(scratch.File("out.bin").c_str(), "wb"), offset, length);
+        copy.output = ReadWholeFile(scratch.File("out.bin"));
         return copy;
     }
     ScratchDir scratch;
@@ -96,34 +97,19 @@ TEST_F(Extract_, NegativeOffsetFailsTheSeek)
     EXPECT_EQ(copy.output.size(), 0u);
 }
 
-TEST_F(Extract_, WriteFailureIsReported)
+TEST_F(Extract_, WriteAndReadFailuresAreReported)
 {
     const std::string in = scratch.File("in.bin");
     WriteBytes(in, Pattern(2 * kMegabyte));
-    FILE* inFile = fopen(in.c_str(), "rb");
     FILE* full = fopen("/dev/full", "wb");
     ASSERT_NE(full, nullptr);
-    StderrCapture capture;
-    ExtractEPSfromTIFFpreview(inFile, full, 0, 2 * kMegabyte);
-    const std::string messages = capture.Text();
-    fclose(inFile);
-    fclose(full);
-    EXPECT_EQ(messages, "Error from fwrite in ExtractEPSfromTIFFpreview\n");
-}
+    EXPECT_EQ(Messages(fopen(in.c_str(), "rb"), full, 0, 2 * kMegabyte),
+              "Error from fwrite in ExtractEPSfromTIFFpreview\n");
 
-TEST_F(Extract_, ReadErrorIsReported)
-{
     // A write-only stream cannot be read from: fread sets the error flag.
-    const std::string in = scratch.File("wo.bin");
-    WriteBytes(in, Pattern(1000));
-    FILE* inFile = fopen(in.c_str(), "ab");
-    FILE* outFile = fopen(scratch.File("out.bin").c_str(), "wb");
-    StderrCapture capture;
-    ExtractEPSfromTIFFpreview(inFile, outFile, 0, 100);
-    const std::string messages = capture.Text();
-    fclose(inFile);
-    fclose(outFile);
-    EXPECT_EQ(messages, "Error from fread in ExtractEPSfromTIFFpreview\n");
+    EXPECT_EQ(Messages(fopen(in.c_str(), "ab"), fopen(scratch.File("out.bin").c_str(), "wb"), 0,
+                       100),
+              "Error from fread in ExtractEPSfromTIFFpreview\n");
 }
 
 TEST_F(Extract_, BufferDegradesAndChunkSizeFollows)

@@ -148,8 +148,8 @@ TEST(FileSystemUtils, LinksAreRemovedButNeverFollowed)
 
     DeleteFolderChildren(Wx(root));
     EXPECT_FALSE(Exists(root));
-    EXPECT_EQ(ReadBytes(outside), "keep me");
-    EXPECT_EQ(ReadBytes(outsideDir + "/keep.txt"), "keep");
+    EXPECT_EQ(ReadWholeFile(outside), "keep me");
+    EXPECT_EQ(ReadWholeFile(outsideDir + "/keep.txt"), "keep");
 }
 
 TEST(FileSystemUtils, ShellCharactersInNamesAreJustCharacters)

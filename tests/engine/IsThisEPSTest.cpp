@@ -43,16 +43,6 @@ Detection Detect(const std::string& path)
     return d;
 }
 
-std::string DosEpsHeader(uint32_t offset, uint32_t length)
-{
-    std::string header = "\xC5\xD0\xD3\xC6";
-    for (uint32_t value : {offset, length, 0u, 0u, 0u, 0u})
-        for (int i = 0; i < 4; ++i)
-            header += static_cast<char>((value >> (8 * i)) & 0xFF);
-    header += "\xFF\xFF"; // checksum
-    return header;
-}
-
 void ExpectBox(const EPSinfo_t& info, double llx, double lly, double urx, double ury)
 {
     EXPECT_DOUBLE_EQ(info.boundingBox[0], llx);

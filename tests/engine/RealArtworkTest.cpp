@@ -108,7 +108,7 @@ TEST(RealArtwork, DosBinaryFromEpstoolGivesThePostScriptSectionOnly)
         const ProcessResult made =
             RunProgram({"epstool", "--add-tiff-preview", "--device", "tiffg3", eps, wrapped});
         ASSERT_EQ(made.exitCode, 0) << made.err;
-        const std::string dosBytes = ReadBytes(wrapped);
+        const std::string dosBytes = ReadWholeFile(wrapped);
         ASSERT_GE(dosBytes.size(), 30u);
         ASSERT_EQ(dosBytes.compare(0, 4, "\xC5\xD0\xD3\xC6"), 0) << "epstool made no DOS EPS";
 
@@ -122,7 +122,7 @@ TEST(RealArtwork, DosBinaryFromEpstoolGivesThePostScriptSectionOnly)
         ASSERT_EQ(ConvertEPStoPS(&context, &a4, fromDos.c_str()), 1);
 
         // Exactly the PostScript section between the wrapper's parts.
-        const std::string out = ReadBytes(fromDos);
+        const std::string out = ReadWholeFile(fromDos);
         const size_t begin = out.find("%%BeginDocument:");
         ASSERT_NE(begin, std::string::npos);
         const size_t body = out.find("\r\n", begin) + 2;
