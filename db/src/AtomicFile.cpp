@@ -73,7 +73,11 @@ int CreateTempBeside(const std::string& target, std::string& tempPath)
     for (int attempt = 0; attempt < 100; ++attempt)
     {
         char suffix[16];
-        snprintf(suffix, sizeof suffix, ".%08x", static_cast<unsigned>(rand_r(&seed)));
+        // A forked child inherits the seed; mixing in the current pid keeps
+        // parent and child from trying the same names in lockstep.
+        const unsigned mixed = static_cast<unsigned>(rand_r(&seed)) ^
+                               (static_cast<unsigned>(::getpid()) * 2654435761u);
+        snprintf(suffix, sizeof suffix, ".%08x", mixed);
         tempPath = directory + "/." + base + suffix + ".tmp";
         const int fd = ::open(tempPath.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
         if (fd >= 0 || errno != EEXIST)
