@@ -11,6 +11,7 @@
 #include "db/PathResolver.h"
 
 const char HotFolder::kServerDescriptionName[] = "ServerDescription.xml";
+const char HotFolder::kServerPpdName[] = "server.ppd";
 const char HotFolder::kOutputFolderName[] = "Output";
 
 static bool IsDirectory(const wxString& path)

@@ -20,6 +20,8 @@ class HotFolder
 public:
     // Beside Folder.cfg in the container.
     static const char kServerDescriptionName[];
+    // Beside it: the printer description it was made from (init --ppd).
+    static const char kServerPpdName[];
     // Beside the container, unless the run names another place.
     static const char kOutputFolderName[];
 

@@ -1,5 +1,9 @@
 // hotfolder init: makes a folder a hot folder.
+#include <cstdio>
+#include <fstream>
 #include <memory>
+#include <sstream>
+#include <string>
 
 #include <wx/filename.h>
 #include <wx/xml/xml.h>
@@ -15,15 +19,23 @@
 #include "db/AtomicFile.h"
 #include "db/HFDatabase.h"
 #include "db/PathResolver.h"
+#ifdef HF_WITH_PRINTING
+#include "ServerFromPpd.h"
+#endif
 
 static const char kInitUsage[] =
-    "usage: hotfolder init FOLDER [--server FILE] [--name NAME] [--module PATH]\n"
+    "usage: hotfolder init FOLDER [--server FILE | --ppd FILE.ppd] [--name NAME]\n"
+    "                             [--module PATH]\n"
     "\n"
     "Makes FOLDER (created when missing) a hot folder: its container\n"
     "\"[_Orv_HotFolder_]\" with Folder.cfg (name, work, failed and kept-originals\n"
     "folders, the filter's default settings), a copy of the server description\n"
     "FILE beside it, and an entry in the machine-wide hot-folder list.\n"
-    "NAME defaults to the folder's own name.\n";
+    "NAME defaults to the folder's own name.\n"
+    "\n"
+    "--ppd FILE.ppd makes the server description from a printer's PPD file\n"
+    "(its papers, default paper and custom size limits) and keeps a copy of\n"
+    "the PPD as server.ppd beside it.\n";
 
 static bool IsListed(const wxString& folder)
 {
@@ -35,13 +47,52 @@ static bool IsListed(const wxString& folder)
     return false;
 }
 
+// The description of the printer a PPD file describes, and the file's bytes.
+static bool LoadPpdServer(const std::string& ppd, ServerDescription& server, std::string& bytes,
+                          wxString& error)
+{
+#ifdef HF_WITH_PRINTING
+    wxString xml;
+    std::string reason;
+    if (!ServerDescriptionFromPpd(ppd, xml, reason))
+    {
+        error = FromUtf8(reason);
+        return false;
+    }
+    std::ifstream in(ppd, std::ios::binary);
+    std::ostringstream content;
+    if (!in || !(content << in.rdbuf()))
+    {
+        error = "cannot read " + FromUtf8(ppd);
+        return false;
+    }
+    bytes = content.str();
+    return server.LoadText(xml, FromUtf8(ppd), error);
+#else
+    (void)ppd;
+    (void)server;
+    (void)bytes;
+    error = "--ppd is not available in this build (it needs CUPS)";
+    return false;
+#endif
+}
+
 int RunInitCommand(const Arguments& args)
 {
     ParsedArgs parsed;
     int status = 0;
-    if (!ParseCommandLine(args, {{"--server", true, false, ""}, {"--name", true, false, ""}},
+    if (!ParseCommandLine(args,
+                          {{"--server", true, false, ""},
+                           {"--ppd", true, false, ""},
+                           {"--name", true, false, ""}},
                           kInitUsage, 1, 1, parsed, status))
         return status;
+    if (parsed.Has("--server") && parsed.Has("--ppd"))
+    {
+        PrintError("--server and --ppd cannot be given together");
+        std::fputs(kInitUsage, stderr);
+        return kExitUsage;
+    }
 
     wxFileName folderName = wxFileName::DirName(FromUtf8(parsed.positionals[0]));
     folderName.MakeAbsolute();
@@ -50,6 +101,12 @@ int RunInitCommand(const Arguments& args)
 
     ServerDescription server;
     if (parsed.Has("--server") && !server.Load(FromUtf8(parsed.Get("--server")), error))
+    {
+        PrintError(error);
+        return kExitSetupFailed;
+    }
+    std::string ppdBytes;
+    if (parsed.Has("--ppd") && !LoadPpdServer(parsed.Get("--ppd"), server, ppdBytes, error))
     {
         PrintError(error);
         return kExitSetupFailed;
@@ -105,6 +162,17 @@ int RunInitCommand(const Arguments& args)
             PrintError("cannot store the server description in " + stored);
             return kExitSetupFailed;
         }
+        if (parsed.Has("--ppd"))
+        {
+            const wxString ppdCopy = wxFileName(db::PathResolver::GetContainerFolderPath(folder),
+                                                HotFolder::kServerPpdName)
+                                         .GetFullPath();
+            if (!db::AtomicFile::Write(ppdCopy, ppdBytes))
+            {
+                PrintError("cannot store the printer description in " + ppdCopy);
+                return kExitSetupFailed;
+            }
+        }
         wxArrayString missing = server.MissingFeatures(info.m_arrRequiredServerFeatures);
         if (!missing.empty())
             PrintError("warning: the server does not offer " + wxJoin(missing, ' ') +
@@ -128,7 +196,7 @@ int RunInitCommand(const Arguments& args)
     PrintLine("Hot folder:     " + folder);
     PrintLine("Configuration:  " + configFile);
     PrintLine("Filter:         " + info.m_strIdentifier);
-    PrintLine("Server:         " +
-              (server.IsEmpty() ? wxString("(none)") : FromUtf8(parsed.Get("--server"))));
+    const std::string origin = parsed.Has("--ppd") ? parsed.Get("--ppd") : parsed.Get("--server");
+    PrintLine("Server:         " + (server.IsEmpty() ? wxString("(none)") : FromUtf8(origin)));
     return kExitSuccess;
 }

@@ -7,6 +7,7 @@
 #include <wx/filename.h>
 
 #include "ConsoleText.h"
+#include "CupsForwarding.h"
 #include "FileMoves.h"
 #include "FilterSession.h"
 #include "JobExecution.h"
@@ -78,6 +79,9 @@ JobOutcome JobRunner::Run(const ReadyToProcessJobInfo& job, size_t index, size_t
     }
     RemoveTree(work);
 
+    wxString result = job.jobName + " -> " + delivered;
+    const wxString refusal = Submit(job, delivered, ticket, result);
+
     for (const wxString& file : job.files)
     {
         wxString kept;
@@ -85,14 +89,41 @@ JobOutcome JobRunner::Run(const ReadyToProcessJobInfo& job, size_t index, size_t
                                error))
         {
             ++m_statistics.failed;
-            m_progress.EndJob(job.jobName + " -> " + delivered);
+            m_progress.EndJob(result);
             PrintError("the original stays in the hot folder: " + error);
             return JobOutcome::OriginalStuck;
         }
     }
+    if (!refusal.empty())
+    {
+        // Processed and delivered, so the original is kept, not failed; the
+        // job still counts as failed because it was not printed.
+        ++m_statistics.failed;
+        m_progress.EndJob(result + ": failed: " + refusal);
+        LogFailure(job.jobName, refusal);
+        PrintError(job.jobName + ": " + refusal + "; the output stays in " + delivered);
+        return JobOutcome::Failed;
+    }
     ++m_statistics.done;
-    m_progress.EndJob(job.jobName + " -> " + delivered);
+    m_progress.EndJob(result);
     return JobOutcome::Done;
+}
+
+wxString JobRunner::Submit(const ReadyToProcessJobInfo& job, const wxString& output,
+                           const wxString& ticket, wxString& note)
+{
+    if (m_places.cupsQueue.empty())
+        return wxString();
+    // The queue shows the name the user dropped in, not the output's.
+    const wxString jobName =
+        job.files.empty() ? job.jobName : wxFileName(job.files[0]).GetFullName();
+    const wxString queue = FromUtf8(m_places.cupsQueue);
+    int jobId = 0;
+    wxString reason;
+    if (!SubmitDeliveredOutput(m_places.cupsQueue, output, ticket, jobName, jobId, reason))
+        return "submission to " + queue + " failed: " + reason;
+    note += wxString::Format(" (queued on %s as CUPS job %d)", queue, jobId);
+    return wxString();
 }
 
 JobOutcome JobRunner::Fail(const ReadyToProcessJobInfo& job, const wxString& reason)

@@ -1,5 +1,6 @@
 #pragma once
 #include <cstddef>
+#include <string>
 
 #include <hotfolder/HFPlugin.h>
 
@@ -15,6 +16,7 @@ struct JobPlaces
     wxString failedFolder; // failed originals and the failure log
     wxString keptFolder;   // originals of successful jobs
     wxString outputFolder; // outputs and their job tickets
+    std::string cupsQueue; // where delivered outputs are printed; empty: nowhere
 };
 
 enum class JobOutcome
@@ -28,8 +30,10 @@ enum class JobOutcome
 // copy of Folder.cfg, Process into it, then the output and its ticket (the
 // work copy of Folder.cfg with the filter's overrides) to the output folder
 // and the original to the kept-originals folder; on failure the original
-// goes to the failed folder with a line in its log. Inputs are only ever
-// moved, never deleted.
+// goes to the failed folder with a line in its log. With a print queue the
+// delivered output is submitted to it; a refused submission fails the job
+// but leaves output and original where they were delivered and kept.
+// Inputs are only ever moved, never deleted.
 class JobRunner
 {
 public:
@@ -46,6 +50,9 @@ public:
 
 private:
     JobOutcome Fail(const ReadyToProcessJobInfo& job, const wxString& reason);
+    // Empty on success, else why the queue did not take the output.
+    wxString Submit(const ReadyToProcessJobInfo& job, const wxString& output,
+                    const wxString& ticket, wxString& note);
     void LogFailure(const wxString& name, const wxString& reason);
 
     FilterSession& m_session;

@@ -10,6 +10,7 @@
 #include "CommandLine.h"
 #include "Commands.h"
 #include "ConsoleText.h"
+#include "CupsForwarding.h"
 #include "FileMoves.h"
 #include "FilterSession.h"
 #include "FolderWatcher.h"
@@ -24,7 +25,7 @@
 
 static const char kRunUsage[] =
     "usage: hotfolder run FOLDER [--watch] [--out DIR] [--settle MS] [--stats]\n"
-    "                     [--delay-jobs MS] [--module PATH]\n"
+    "                     [--delay-jobs MS] [--submit cups:QUEUE] [--module PATH]\n"
     "\n"
     "Processes the files in the hot folder FOLDER with the filter and the\n"
     "settings stored in it. Outputs and their job tickets (<output>.Folder.cfg)\n"
@@ -38,6 +39,11 @@ static const char kRunUsage[] =
     "                   marker in the warehouse.\n"
     "  --stats          print where the time went (inside and outside the filter)\n"
     "  --delay-jobs MS  wait between finding the jobs and processing them\n"
+    "  --submit cups:QUEUE\n"
+    "                   print every delivered output on the CUPS queue QUEUE\n"
+    "                   (of the scheduler CUPS_SERVER or client.conf names), with\n"
+    "                   the job's overrides as options; a refused submission\n"
+    "                   counts as a failed job, its output stays delivered\n"
     "\n"
     "Exit status: 0 when every job succeeded, 1 when a job failed, 2 for a bad\n"
     "command line, 3 when the folder, its configuration or the module is unusable.\n";
@@ -163,7 +169,8 @@ int RunRunCommand(const Arguments& args)
                            {"--out", true, false, ""},
                            {"--settle", true, false, ""},
                            {"--delay-jobs", true, false, ""},
-                           {"--stats", false, false, ""}},
+                           {"--stats", false, false, ""},
+                           {"--submit", true, false, ""}},
                           kRunUsage, 1, 1, parsed, status))
         return status;
     const long settleMs = ParseMilliseconds(parsed.Get("--settle"), 500);
@@ -175,6 +182,21 @@ int RunRunCommand(const Arguments& args)
     }
 
     wxString error;
+    std::string cupsQueue;
+    if (parsed.Has("--submit"))
+    {
+        if (!ParseSubmitTarget(parsed.Get("--submit"), cupsQueue, error))
+        {
+            PrintError(error);
+            return kExitUsage;
+        }
+        if (!CupsSubmissionAvailable())
+        {
+            PrintError("--submit: CUPS submission is not available in this build");
+            return kExitSetupFailed;
+        }
+    }
+
     HotFolder folder;
     if (!folder.Open(FromUtf8(parsed.positionals[0]), error))
     {
@@ -194,6 +216,7 @@ int RunRunCommand(const Arguments& args)
     places.workFolder = folder.GetWorkFolder();
     places.failedFolder = folder.GetFailedFolder();
     places.keptFolder = folder.GetKeptOriginalsFolder();
+    places.cupsQueue = cupsQueue;
     if (parsed.Has("--out"))
     {
         wxFileName out = wxFileName::DirName(FromUtf8(parsed.Get("--out")));

@@ -1,11 +1,16 @@
 // hotfolder: the reference host of the hot-folder filter modules.
 #include <cstdio>
 #include <cstring>
+#include <string>
+#include <vector>
 
 #include <wx/init.h>
 
 #include "Commands.h"
 #include "ConsoleText.h"
+#ifdef HF_WITH_PRINTING
+#include "ServerFromPpdCommand.h"
+#endif
 
 static const char kUsage[] =
     "usage: hotfolder <command> [options]\n"
@@ -16,6 +21,8 @@ static const char kUsage[] =
     "  settings  show or change a hot folder's filter settings\n"
     "  run       process the files waiting in a hot folder (--watch: keep going)\n"
     "  convert   put one file through the filter\n"
+    "  server-from-ppd\n"
+    "            write the server description of a printer from its PPD file\n"
     "\n"
     "'hotfolder <command> --help' describes each command.\n"
     "Every command takes --module PATH to name the filter module; otherwise\n"
@@ -50,6 +57,15 @@ int main(int argc, char** argv)
         return RunRunCommand(args);
     if (command == "convert")
         return RunConvertCommand(args);
+    if (command == "server-from-ppd")
+    {
+#ifdef HF_WITH_PRINTING
+        return RunServerFromPpdCommand(std::vector<std::string>(argv + 2, argv + argc));
+#else
+        PrintError("server-from-ppd is not available in this build (it needs CUPS)");
+        return kExitSetupFailed;
+#endif
+    }
     PrintError(wxString::Format("unknown command \"%s\"; try hotfolder --help", FromUtf8(command)));
     return kExitUsage;
 }
