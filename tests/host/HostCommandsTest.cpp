@@ -145,3 +145,18 @@ TEST_F(HostTest, ConvertRefusesWhatTheFilterDoesNotAccept)
     EXPECT_EQ(Host({"convert", scratch + "/list.eps", "-o", scratch + "/list.eps"}).exitCode, 2);
     EXPECT_EQ(ReadFile(scratch + "/list.eps"), ReadFile(kExamples + "/eps/not-really.eps"));
 }
+
+TEST_F(HostTest, RunRefusesASubmitTargetThatIsNoCupsQueue)
+{
+    std::string folder = MakePostScriptFolder();
+    CopyExample("label.eps", folder);
+    for (const char* target : {"lp:office", "cups:", "cups:two words", "cups:a/b", "office"})
+    {
+        hf_test::ProcessResult run = Host({"run", folder, "--submit", target});
+        EXPECT_EQ(run.exitCode, 2) << target;
+        EXPECT_NE(run.err.find("cups:QUEUE"), std::string::npos) << run.err;
+    }
+    // Refused before anything was processed.
+    EXPECT_TRUE(Exists(folder + "/label.eps"));
+    EXPECT_FALSE(Exists(folder + "/Output"));
+}

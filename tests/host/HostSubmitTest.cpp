@@ -1,0 +1,106 @@
+// run --submit cups:QUEUE against a CUPS scheduler of the test's own: the
+// delivered output reaches the queue's device on the job's paper, and a
+// queue that refuses leaves the output delivered and fails the run.
+#include <memory>
+
+#include "HostTestSupport.h"
+#include "PpdSources.h"
+#include "PrivateCupsd.h"
+
+using namespace host_test;
+
+namespace
+{
+const char* const kQueue = "hotfolder_run";
+const char* const kFilter = "/usr/lib/cups/filter/pstops";
+
+class HostSubmit : public HostTest
+{
+protected:
+    void SetUp() override
+    {
+        HostTest::SetUp();
+        if (!cups_test::PrivateCupsd::Installed())
+            GTEST_SKIP() << "cupsd or lpadmin missing (packages cups-daemon, cups-client)";
+        if (access(kFilter, X_OK) != 0)
+            GTEST_SKIP() << kFilter << " missing (package cups-core-drivers)";
+        // The queue's filters run as the print user and must reach the spool
+        // and the device file below the scratch directory.
+        ASSERT_EQ(chmod(scratch.c_str(), 0755), 0);
+        const std::string root = scratch + "/cups";
+        ASSERT_EQ(mkdir(root.c_str(), 0755), 0);
+        scheduler = std::make_unique<cups_test::PrivateCupsd>(root);
+        std::string problem;
+        ASSERT_TRUE(scheduler->Start(problem)) << problem;
+        device = scratch + "/device.ps";
+        ASSERT_TRUE(scheduler->AddFileQueue(kQueue, ppd_sources::TestPpd(), device, problem))
+            << problem;
+        // The host is a CUPS client like any other: it finds the scheduler here.
+        setenv("CUPS_SERVER", scheduler->Server().c_str(), 1);
+    }
+    void TearDown() override
+    {
+        unsetenv("CUPS_SERVER");
+        scheduler.reset();
+        HostTest::TearDown();
+    }
+
+    // A hot folder bound to the queue's printer, converting on paper.
+    std::string MakePrinterFolder(const std::string& paper)
+    {
+        const std::string folder = scratch + "/hot";
+        hf_test::ProcessResult init = Host({"init", folder, "--ppd", ppd_sources::TestPpd()});
+        EXPECT_EQ(init.exitCode, 0) << init.err;
+        hf_test::ProcessResult set = Host({"settings", folder, "--set", "OUTPUTFILETYPEEPS=0",
+                                           "OUTPUTFILETYPEPS=1", "DEFAULTPAGESIZE=" + paper});
+        EXPECT_EQ(set.exitCode, 0) << set.err;
+        return folder;
+    }
+
+    std::unique_ptr<cups_test::PrivateCupsd> scheduler;
+    std::string device;
+};
+} // namespace
+
+TEST_F(HostSubmit, TheOutputIsPrintedOnTheJobsPaper)
+{
+    // Letter, not the queue's default A4: the paper travels with the job.
+    const std::string folder = MakePrinterFolder("Letter");
+    CopyExample("label.eps", folder);
+    hf_test::ProcessResult run = Host({"run", folder, "--submit", std::string("cups:") + kQueue});
+    ASSERT_EQ(run.exitCode, 0) << run.err << scheduler->Log();
+    EXPECT_NE(run.out.find(std::string("queued on ") + kQueue + " as CUPS job "), std::string::npos)
+        << run.out;
+    EXPECT_NE(run.out.find("1 done, 0 failed"), std::string::npos) << run.out;
+    EXPECT_TRUE(Exists(folder + "/Output/label.ps"));
+    EXPECT_TRUE(Exists(Kept(folder) + "/label.eps"));
+
+    // The device file is written once the queue's filters are through.
+    const std::string selected = "%%BeginFeature: *PageSize Letter\n"
+                                 "<</PageSize[612 792]/ImagingBBox null>>setpagedevice";
+    EXPECT_TRUE(
+        WaitFor([&] { return ReadFile(device).find(selected) != std::string::npos; }, 60000))
+        << ReadFile(device) << scheduler->Log();
+    // The job is the filter's output (the EPS placed on a page), not the
+    // original EPS.
+    const std::string printed = ReadFile(device);
+    EXPECT_NE(printed.find("%%BeginDocument: /label.eps"), std::string::npos) << printed;
+    EXPECT_NE(printed.find("(Hot folder) show"), std::string::npos) << printed;
+}
+
+TEST_F(HostSubmit, ARefusedSubmissionKeepsTheOutputAndFailsTheRun)
+{
+    const std::string folder = MakePrinterFolder("A4");
+    CopyExample("label.eps", folder);
+    hf_test::ProcessResult run = Host({"run", folder, "--submit", "cups:no_such_queue"});
+    EXPECT_EQ(run.exitCode, 1) << run.out << run.err;
+    EXPECT_NE(run.err.find("submission to no_such_queue failed: "), std::string::npos) << run.err;
+    EXPECT_NE(run.out.find("0 done, 1 failed"), std::string::npos) << run.out;
+    // Processed all the same: output and ticket delivered, original kept.
+    EXPECT_TRUE(Exists(folder + "/Output/label.ps"));
+    EXPECT_TRUE(Exists(folder + "/Output/label.ps.Folder.cfg"));
+    EXPECT_EQ(ListDirectory(Kept(folder)), std::vector<std::string>{"label.eps"});
+    EXPECT_NE(ReadFile(Failed(folder) + "/failed-jobs.log").find("submission to no_such_queue"),
+              std::string::npos);
+    EXPECT_FALSE(Exists(device));
+}
