@@ -1,8 +1,6 @@
 #include "GuiTestSupport.h"
 
 #include <cstdlib>
-#include <fstream>
-#include <sstream>
 #include <stdexcept>
 
 #include <wx/app.h>
@@ -14,6 +12,8 @@
 #include <wx/radiobut.h>
 #include <wx/stopwatch.h>
 #include <wx/textctrl.h>
+
+#include "GhostscriptOracle.h"
 
 namespace
 {
@@ -129,17 +129,9 @@ void TypeText(wxTextCtrl* field, const wxString& text)
     field->HandleWindowEvent(event);
 }
 
-std::string ReadTextFile(const wxString& path)
+wxString TestDataText(const wxString& relative)
 {
-    std::ifstream in(path.ToStdString(), std::ios::binary);
-    std::ostringstream text;
-    text << in.rdbuf();
-    return text.str();
-}
-
-wxString TestDataPath(const wxString& relative)
-{
-    return wxString(HF_TEST_DATA_DIR) + "/" + relative;
+    return hf_test::ReadWholeFile(std::string(HF_TEST_DATA_DIR) + "/" + relative.ToStdString());
 }
 
 std::map<std::string, std::string> Sorted(const MapPropToValue& settings)

@@ -35,8 +35,8 @@ void ToggleCheck(wxCheckBox* check);
 void SelectComboItem(wxComboBox* combo, const wxString& item);
 void TypeText(wxTextCtrl* field, const wxString& text);
 
-std::string ReadTextFile(const wxString& path);
-wxString TestDataPath(const wxString& relative);
+// The text of a file in the test data folder.
+wxString TestDataText(const wxString& relative);
 
 // A map as an ordered std::map, for whole-map comparisons with readable
 // failure output.

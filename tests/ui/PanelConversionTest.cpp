@@ -2,7 +2,6 @@
 // the user picks a custom page, a corner and an image width, the host
 // saves, a filter set up from that preference converts, and Ghostscript shows the artwork where the
 // user asked.
-#include <wx/filename.h>
 #include <wx/xml/xml.h>
 
 #include "EPS.h"
@@ -13,9 +12,7 @@
 
 using namespace ui_test;
 
-class PanelConversion : public PanelTest
-{
-};
+using PanelConversion = PanelTest;
 
 TEST_F(PanelConversion, SavedChoicesPlaceAndSizeTheArtwork)
 {
@@ -23,7 +20,7 @@ TEST_F(PanelConversion, SavedChoicesPlaceAndSizeTheArtwork)
         GTEST_SKIP() << "Ghostscript is not installed";
 
     EPS filter("EPS");
-    ASSERT_EQ(0, filter.Initialize(ReadTextFile(TestDataPath("ui/server-ui.xml"))));
+    ASSERT_EQ(0, filter.Initialize(TestDataText("ui/server-ui.xml")));
     ASSERT_TRUE(filter.IsFilterEnabled());
     m_panel = wxDynamicCast(filter.ShowPluginUI(m_frame), ImageSizePanelWithoutMerge);
     ASSERT_NE(nullptr, m_panel);
@@ -43,20 +40,17 @@ TEST_F(PanelConversion, SavedChoicesPlaceAndSizeTheArtwork)
     // The folder's jobs run on a filter set up from the saved preference;
     // the page command is fixed at an object's first parameter load.
     EPS processing("EPS");
-    ASSERT_EQ(0, processing.Initialize(ReadTextFile(TestDataPath("ui/server-ui.xml"))));
+    ASSERT_EQ(0, processing.Initialize(TestDataText("ui/server-ui.xml")));
     ASSERT_EQ(0, processing.InitilaizeFromPreference(&host));
 
-    const wxString folder = wxFileName::CreateTempFileName("hf-ui-conversion");
-    wxRemoveFile(folder);
-    ASSERT_TRUE(wxFileName::Mkdir(folder));
-    const wxString input = folder + "/art.eps", output = folder + "/art.ps";
+    const sample::ScratchDir folder;
+    const wxString input = folder.File("art.eps"), output = folder.File("art.ps");
     ASSERT_TRUE(sample::WriteFile(input, sample::RectangleEps(0, 0, 100, 50)));
     void* context = nullptr;
     ASSERT_EQ(1u, IsThisEPS(input.fn_str(), &context));
     ASSERT_EQ(1, ConvertEPStoPS(&context, &processing.GetParams(), output.fn_str()));
 
     const hf_test::GhostscriptReport report = hf_test::RunGhostscriptBBox(output.ToStdString());
-    wxFileName::Rmdir(folder, wxPATH_RMDIR_RECURSIVE);
     ASSERT_FALSE(report.postscriptError) << report.process.err;
     ASSERT_TRUE(report.marked);
     EXPECT_NEAR(500, report.pageWidth, 0.5);

@@ -51,12 +51,9 @@ Keys LetterDefaults()
         {"SCALETOPRINT", "0"},
     };
 }
-
 } // namespace
 
-class SettingsPanel : public PanelTest
-{
-};
+using SettingsPanel = PanelTest;
 
 TEST_F(SettingsPanel, EmptyMapLoadsEpsOutputWithPageAndImageControlsOff)
 {
@@ -127,10 +124,8 @@ TEST_F(SettingsPanel, PickingPsEnablesControlsAndResetsToOriginalSizeOnlyOnce)
 
 TEST_F(SettingsPanel, CustomPageSizeIsWrittenInPointsWithATruncatedCommand)
 {
-    Build();
     MapPropToValue settings;
-    settings["OUTPUTFILETYPEEPS"] = "0";
-    m_panel->LoadUISettings(settings);
+    BuildAndLoadPs(settings);
 
     wxTEST_DIALOG(ClickButton(ID_CUSTOMPAGESIZE_BUTTON), EnterCustomSizeInPoints("595.5", "842.9"));
     EXPECT_EQ("8.27in x 11.71in", Combo(ID_PAGESIZE_COMBO)->GetValue());
@@ -166,10 +161,8 @@ TEST_F(SettingsPanel, CustomPageSizeIsWrittenInPointsWithATruncatedCommand)
 
 TEST_F(SettingsPanel, CancelledCustomDialogLeavesThePaperChoice)
 {
-    Build();
     MapPropToValue settings;
-    settings["OUTPUTFILETYPEEPS"] = "0";
-    m_panel->LoadUISettings(settings);
+    BuildAndLoadPs(settings);
     const unsigned entries = Combo(ID_PAGESIZE_COMBO)->GetCount();
     wxTEST_DIALOG(ClickButton(ID_CUSTOMPAGESIZE_BUTTON), CancelCustomSize());
     EXPECT_EQ(entries, Combo(ID_PAGESIZE_COMBO)->GetCount());
@@ -179,15 +172,13 @@ TEST_F(SettingsPanel, CancelledCustomDialogLeavesThePaperChoice)
 
 TEST_F(SettingsPanel, StoredCustomPageIsShownInTheStoredUnit)
 {
-    Build();
     MapPropToValue settings;
-    settings["OUTPUTFILETYPEEPS"] = "0";
     settings["CUSTOMPAGESIZE"] = "1";
     settings["CUSTOMPAGEWIDTH"] = "612.000000";
     settings["CUSTOMPAGEHEIGHT"] = "792.000000";
     settings["CUSTOMPAGETUNIT"] = "1";
     settings["DEFAULTPAGESIZE"] = "215.90mm x 279.40mm";
-    m_panel->LoadUISettings(settings);
+    BuildAndLoadPs(settings);
     EXPECT_EQ("215.90mm x 279.40mm", Combo(ID_PAGESIZE_COMBO)->GetValue());
     EXPECT_EQ(UNIT_MM, m_panel->GetCustomPageUnit());
 
@@ -205,10 +196,8 @@ TEST_F(SettingsPanel, StoredCustomPageIsShownInTheStoredUnit)
 
 TEST_F(SettingsPanel, ImageWidthLimitsAreCheckedOnSave)
 {
-    Build();
     MapPropToValue settings;
-    settings["OUTPUTFILETYPEEPS"] = "0";
-    m_panel->LoadUISettings(settings);
+    BuildAndLoadPs(settings);
     ClickRadio(Radio(ID_CUSTOMSIZE_RADIO));
 
     TypeText(Text(ID_WIDTH_TEXT), "48");
@@ -227,13 +216,11 @@ TEST_F(SettingsPanel, ImageWidthLimitsAreCheckedOnSave)
 
 TEST_F(SettingsPanel, ConstrainedHeightIsNotCheckedWhileWidthDrives)
 {
-    Build();
     MapPropToValue settings;
-    settings["OUTPUTFILETYPEEPS"] = "0";
     settings["CUSTOMSIZE"] = "1";
     settings["ORIGINALSIZE"] = "0";
     settings["ORIGINALHEIGHT"] = "99";
-    m_panel->LoadUISettings(settings);
+    BuildAndLoadPs(settings);
     EXPECT_TRUE(Radio(ID_CUSTOMSIZE_RADIO)->GetValue());
     EXPECT_FALSE(Enabled(ID_HEIGHT_TEXT));
     ASSERT_TRUE(Save(settings));
@@ -251,10 +238,8 @@ TEST_F(SettingsPanel, ConstrainedHeightIsNotCheckedWhileWidthDrives)
 
 TEST_F(SettingsPanel, UnitChangeConvertsTheFieldAndMillimetreLimitsApply)
 {
-    Build();
     MapPropToValue settings;
-    settings["OUTPUTFILETYPEEPS"] = "0";
-    m_panel->LoadUISettings(settings);
+    BuildAndLoadPs(settings);
     ClickRadio(Radio(ID_CUSTOMSIZE_RADIO));
     TypeText(Text(ID_WIDTH_TEXT), "8.5");
     SelectComboItem(Combo(ID_WIDTH_UNIT_COMBO), "mm");
@@ -280,14 +265,12 @@ TEST_F(SettingsPanel, UnitChangeConvertsTheFieldAndMillimetreLimitsApply)
 
 TEST_F(SettingsPanel, ValidatorsMoveValuesBetweenMembersAndControls)
 {
-    Build();
     MapPropToValue settings;
-    settings["OUTPUTFILETYPEEPS"] = "0";
     settings["FITTOPAGE"] = "0";
     settings["SHRINKTOFIT"] = "1";
     settings["IMAGEPOSITION"] = "Top Left";
     settings["ORIGINALWIDTH"] = "3.5";
-    m_panel->LoadUISettings(settings);
+    BuildAndLoadPs(settings);
     EXPECT_TRUE(Radio(ID_SHRINKTOFIT_RADIO)->GetValue());
     EXPECT_EQ("Top Left", Combo(ID_IMAGEPOSITION_COMBO)->GetValue());
     EXPECT_EQ("3.5", Text(ID_WIDTH_TEXT)->GetValue());
@@ -333,13 +316,11 @@ TEST_F(SettingsPanel, DisabledFilterShowsHeaderAndInputTypeOnlyAndTouchesNoKey)
 
 TEST_F(SettingsPanel, TabOrderFollowsTheLayout)
 {
-    Build();
     MapPropToValue settings;
-    settings["OUTPUTFILETYPEEPS"] = "0";
     settings["ORIGINALSIZE"] = "0";
     settings["CUSTOMSIZE"] = "1";
     settings["CONTRAINPROPORTION"] = "0";
-    m_panel->LoadUISettings(settings);
+    BuildAndLoadPs(settings);
 
     // The toolkit tabs through the panel's children in list order.
     std::vector<int> order;

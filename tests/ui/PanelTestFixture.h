@@ -77,12 +77,20 @@ protected:
     ImageSizePanelWithoutMerge* Build(bool enabled = true,
                                       const wxString& server = "ui/server-ui.xml")
     {
-        const wxString xml = ReadTextFile(TestDataPath(server));
+        const wxString xml = TestDataText(server);
         wxWindow* window = ImageSizePanelWithoutMerge_Factory::CreateInstance(
             m_frame, xml, "EPS", ".eps", enabled, enabled);
         m_panel = wxDynamicCast(window, ImageSizePanelWithoutMerge);
         m_frame->Layout();
         return m_panel;
+    }
+
+    // Builds the panel and loads settings with PostScript output chosen.
+    void BuildAndLoadPs(MapPropToValue& settings)
+    {
+        Build();
+        settings["OUTPUTFILETYPEEPS"] = "0";
+        m_panel->LoadUISettings(settings);
     }
 
     // What the host does on OK.
