@@ -1,27 +1,15 @@
 // The whole road of jobs through the loaded module, as a host drives it:
 // dlopen, initialise with a server description, load the folder's filter
 // node, sniff, process with progress, and look at what came out.
-#include <dlfcn.h>
-
-#include <utility>
-#include <vector>
-
 #include <gtest/gtest.h>
-#include <hotfolder/HFPlugin.h>
 #include <wx/dir.h>
 #include <wx/filename.h>
-#include <wx/xml/xml.h>
 
 #include "GhostscriptOracle.h"
+#include "HostModule.h"
 #include "SampleEps.h"
-#include "db/ConfigurationReader.h"
-#include "db/FilterConfiguration.h"
-#include "db/FolderConfiguration.h"
-#include "db/HFDatabase.h"
-#include "db/ImposeConfiguration.h"
-#include "db/JobConfiguration.h"
-#include "db/PreflightConfiguration.h"
-#include "db/Setting.h"
+
+using namespace hf_test;
 
 namespace
 {
@@ -30,42 +18,14 @@ const char* const kServer =
     "<SheetInfo><PaperName>Letter</PaperName><Width>612</Width><Height>792</Height>"
     "<PSCommand>&lt;&lt;/PageSize [612 792]&gt;&gt; setpagedevice</PSCommand></SheetInfo></Server>";
 
-struct Recorder : IProgressTracker
-{
-    std::vector<std::pair<wxString, int>> calls;
-    void ReportProgress(const wxString& path, int percent) override
-    {
-        calls.emplace_back(path, percent);
-    }
-};
-
-wxXmlNode* Setting(wxXmlNode* ui, const char* key, const char* value)
-{
-    auto* node = new wxXmlNode(wxXML_ELEMENT_NODE, key);
-    node->AddChild(new wxXmlNode(wxXML_TEXT_NODE, "text", value));
-    ui->AddChild(node);
-    return node;
-}
-
-class Host : public ::testing::Test
+class Host : public ModuleTest
 {
 protected:
     void SetUp() override
     {
-        module = dlopen(HF_MODULE_PATH, RTLD_NOW | RTLD_LOCAL);
-        ASSERT_NE(module, nullptr) << dlerror();
-        auto make = reinterpret_cast<GetPluginInstanceFn>(dlsym(module, "GetPluginInstance"));
-        release = reinterpret_cast<ReleasePluginInstanceFn>(dlsym(module, "ReleasePluginInstance"));
-        ASSERT_TRUE(make && release);
-        plugin = make(L"EPS");
-        ASSERT_NE(plugin, nullptr);
-    }
-    void TearDown() override
-    {
-        if (plugin)
-            release(plugin);
-        if (module)
-            dlclose(module);
+        ModuleTest::SetUp();
+        if (!HasFatalFailure())
+            NewPlugin();
     }
 
     // The folder's filter node as the host keeps it in Folder.cfg.
@@ -75,25 +35,10 @@ protected:
         auto* ui = new wxXmlNode(wxXML_ELEMENT_NODE, "UI");
         filter.AddChild(ui);
         for (const auto& [key, value] : settings)
-            Setting(ui, key, value);
+            AddSetting(ui, key, value);
         ASSERT_EQ(plugin->Initialize(kServer), 0);
         ASSERT_EQ(plugin->InitilaizeFromPreference(&filter), 0);
     }
-
-    void WriteFolderConfig(const wxString& folder)
-    {
-        db::Setting setting;
-        setting.SetName("hot");
-        wxString saved;
-        db::HFDatabase::WriteFolderProperties(
-            wxFileName(folder, "Folder.cfg").GetFullPath(), setting, db::JobConfiguration(),
-            db::FolderConfiguration(), db::FilterConfiguration(), db::ImposeConfiguration(),
-            db::PreflightConfiguration(), saved);
-    }
-
-    void* module = nullptr;
-    HFPlugin* plugin = nullptr;
-    ReleasePluginInstanceFn release = nullptr;
 };
 } // namespace
 
@@ -104,18 +49,18 @@ TEST_F(Host, FolderOfMixedFilesToPlacedPages)
     sample::WriteFile(hot.File("plain.eps"), artwork);
     sample::WriteFile(hot.File("binary.eps"),
                       sample::DosEpsBinary(artwork, std::string(5000, '\x7f')));
-    if (hf_test::ProgramAvailable("epstool"))
+    if (ProgramAvailable("epstool"))
     {
-        const auto made = hf_test::RunProgram({"epstool", "--add-tiff-preview", "--device",
-                                               "tiffg3", hot.File("plain.eps").ToStdString(),
-                                               hot.File("tool.eps").ToStdString()});
+        const auto made =
+            RunProgram({"epstool", "--add-tiff-preview", "--device", "tiffg3",
+                        hot.File("plain.eps").ToStdString(), hot.File("tool.eps").ToStdString()});
         ASSERT_EQ(made.exitCode, 0) << made.err;
     }
     sample::WriteFile(hot.File("letter.eps"), "Dear printer,\nthis is not PostScript.\n");
     sample::WriteFile(hot.File("notes.txt"), "notes\n");
     hot.Sub("ppml");
     sample::WriteFile(hot.File("ppml/job.ppml"), "<PPML/>");
-    WriteFolderConfig(out.Path());
+    WriteEmptyFolderConfig(out.File("Folder.cfg"));
 
     LoadSettings({{"OUTPUTFILETYPEEPS", "0"},
                   {"ORIGINALSIZE", "1"},
@@ -149,12 +94,12 @@ TEST_F(Host, FolderOfMixedFilesToPlacedPages)
     ASSERT_EQ(plugin->SniffFolder(hot.Path(), rejected, jobs), 0);
     ASSERT_EQ(rejected.size(), 1u);
     EXPECT_EQ(wxFileName(rejected[0]).GetFullName(), "notes.txt");
-    const size_t expectedJobs = hf_test::ProgramAvailable("epstool") ? 3u : 2u;
+    const size_t expectedJobs = ProgramAvailable("epstool") ? 3u : 2u;
     ASSERT_EQ(jobs.GetCount(), expectedJobs);
 
     for (size_t i = 0; i < jobs.GetCount(); ++i)
     {
-        Recorder progress;
+        ProgressRecorder progress;
         wxString outputName;
         ASSERT_EQ(plugin->Process("", jobs[i], out.Path(), outputName, &progress), 0)
             << jobs[i].jobName;
@@ -165,9 +110,9 @@ TEST_F(Host, FolderOfMixedFilesToPlacedPages)
         EXPECT_EQ(outputName, wxFileName(input).GetName() + ".ps");
 
         const std::string ps = out.File(outputName).ToStdString();
-        const std::string bytes = hf_test::ReadWholeFile(ps);
+        const std::string bytes = ReadWholeFile(ps);
         EXPECT_EQ(bytes.find("\x7f\x7f\x7f"), std::string::npos) << "preview bytes copied";
-        const hf_test::GhostscriptReport gs = hf_test::RunGhostscriptBBox(ps);
+        const GhostscriptReport gs = RunGhostscriptBBox(ps);
         EXPECT_FALSE(gs.postscriptError) << gs.process.err;
         ASSERT_TRUE(gs.pageSeen && gs.marked) << gs.process.out << gs.process.err;
         EXPECT_NEAR(gs.pageWidth, 612, 0.5);
@@ -179,10 +124,9 @@ TEST_F(Host, FolderOfMixedFilesToPlacedPages)
         EXPECT_NEAR(gs.marks.ury, 774, 1);
     }
 
-    db::JobConfiguration overrides;
-    db::ConfigurationReader::ReadJobConfiguration(out.File("Folder.cfg"), overrides);
-    ASSERT_EQ(overrides.GetProperties().size(), 1u);
-    EXPECT_EQ(overrides.GetProperties().at("PageSize").GetValue(), "Letter");
+    const auto overrides = FolderOverrides(out.File("Folder.cfg"));
+    ASSERT_EQ(overrides.size(), 1u);
+    EXPECT_EQ(overrides.at("PageSize").GetValue(), "Letter");
 
     // An .eps that is not EPS fails the job with its own text.
     ReadyToProcessJobInfo fake;
@@ -199,7 +143,7 @@ TEST_F(Host, PassThroughReportsTheInputAndWritesNothing)
 {
     sample::ScratchDir hot, out;
     sample::WriteFile(hot.File("a.eps"), sample::RectangleEps(0, 0, 10, 10));
-    WriteFolderConfig(out.Path());
+    WriteEmptyFolderConfig(out.File("Folder.cfg"));
     LoadSettings({{"OUTPUTFILETYPEEPS", "1"}, {"DEFAULTPAGESIZE", "A4"}});
     wxArrayString files, second, rejected;
     files.Add(hot.File("a.eps"));
@@ -210,7 +154,5 @@ TEST_F(Host, PassThroughReportsTheInputAndWritesNothing)
     EXPECT_EQ(plugin->Process("", jobs[0], out.Path(), name, nullptr), 0);
     EXPECT_EQ(name, "a.eps");
     EXPECT_FALSE(wxFileName::FileExists(out.File("a.ps")));
-    db::JobConfiguration overrides;
-    db::ConfigurationReader::ReadJobConfiguration(out.File("Folder.cfg"), overrides);
-    EXPECT_TRUE(overrides.GetProperties().empty());
+    EXPECT_TRUE(FolderOverrides(out.File("Folder.cfg")).empty());
 }

@@ -8,32 +8,18 @@
 #include <wx/filename.h>
 
 #include "EPS.h"
+#include "HostModule.h"
 #include "SampleEps.h"
-#include "db/ConfigurationReader.h"
-#include "db/FilterConfiguration.h"
-#include "db/FolderConfiguration.h"
-#include "db/HFDatabase.h"
-#include "db/ImposeConfiguration.h"
-#include "db/JobConfiguration.h"
-#include "db/PreflightConfiguration.h"
-#include "db/Setting.h"
+
+using hf_test::FolderOverrides;
 
 namespace
 {
-struct Recorder : IProgressTracker
-{
-    std::vector<std::pair<wxString, int>> calls;
-    void ReportProgress(const wxString& path, int percent) override
-    {
-        calls.emplace_back(path, percent);
-    }
-};
-
 struct Jobs : ::testing::Test
 {
     sample::ScratchDir in, out;
     EPS eps{"x"};
-    Recorder progress;
+    hf_test::ProgressRecorder progress;
 
     void SetUp() override
     {
@@ -44,26 +30,10 @@ struct Jobs : ::testing::Test
         eps.GetSettings()["FORCEPAGESIZEY"] = "842";
         wxXmlNode none(wxXML_ELEMENT_NODE, "Filter");
         eps.InitilaizeFromPreference(&none);
-        WriteEmptyFolderConfig();
+        hf_test::WriteEmptyFolderConfig(out.File("Folder.cfg"), "folder");
     }
 
-    void WriteEmptyFolderConfig()
-    {
-        db::Setting setting;
-        setting.SetName("folder");
-        wxString saved;
-        db::HFDatabase::WriteFolderProperties(out.File("Folder.cfg"), setting,
-                                              db::JobConfiguration(), db::FolderConfiguration(),
-                                              db::FilterConfiguration(), db::ImposeConfiguration(),
-                                              db::PreflightConfiguration(), saved);
-    }
-
-    db::JobConfiguration::Map Overrides()
-    {
-        db::JobConfiguration job;
-        db::ConfigurationReader::ReadJobConfiguration(out.File("Folder.cfg"), job);
-        return job.GetProperties();
-    }
+    db::JobConfiguration::Map Overrides() { return FolderOverrides(out.File("Folder.cfg")); }
 
     ReadyToProcessJobInfo Job(std::initializer_list<wxString> files)
     {
@@ -125,7 +95,7 @@ TEST_F(Jobs, OnlyTheLastFileDecides)
     EXPECT_EQ(Overrides().count("PageSize"), 1u);
 
     // The other way round the job fails and writes no overrides.
-    WriteEmptyFolderConfig();
+    hf_test::WriteEmptyFolderConfig(out.File("Folder.cfg"), "folder");
     out.Sub("second2.ps");
     const wxString second2 = Eps("second2.eps");
     EXPECT_EQ(eps.Process("", Job({first, second2}), out.Path(), name, nullptr), -1003);

@@ -76,15 +76,22 @@ inline ProcessResult RunProgram(const std::vector<std::string>& args)
     return result;
 }
 
-// True when name is an executable file in one of the PATH folders.
-inline bool ProgramAvailable(const std::string& name)
+// Path of the executable name in the PATH folders, then in the extra ones
+// (colon-separated); "" when absent.
+inline std::string FindProgram(const std::string& name, const std::string& extra = "")
 {
     const char* path = std::getenv("PATH");
-    std::istringstream folders(path ? path : "/usr/bin:/bin");
+    std::istringstream folders(std::string(path ? path : extra.empty() ? "/usr/bin:/bin" : "") +
+                               ":" + extra);
     for (std::string folder; std::getline(folders, folder, ':');)
         if (!folder.empty() && access((folder + "/" + name).c_str(), X_OK) == 0)
-            return true;
-    return false;
+            return folder + "/" + name;
+    return std::string();
+}
+
+inline bool ProgramAvailable(const std::string& name)
+{
+    return !FindProgram(name).empty();
 }
 
 struct Box
