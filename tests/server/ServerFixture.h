@@ -1,18 +1,16 @@
 #pragma once
-#include <fstream>
-#include <sstream>
 #include <string>
 
 #include <wx/string.h>
+
+#include "GhostscriptOracle.h"
 
 // The text of a server description under tests/data/server, as the host
 // hands it over.
 inline wxString ServerFixture(const std::string& name)
 {
-    std::ifstream in(std::string(HF_TEST_DATA_DIR) + "/server/" + name, std::ios::binary);
-    std::ostringstream text;
-    text << in.rdbuf();
-    return wxString::FromUTF8(text.str());
+    return wxString::FromUTF8(
+        hf_test::ReadWholeFile(std::string(HF_TEST_DATA_DIR) + "/server/" + name));
 }
 
 // A one-element description for the flag and value variants.
