@@ -1,41 +1,24 @@
 // The built module, set up from a description made from a PPD, lays EPS
 // artwork out on each printer paper: Ghostscript sees that paper's size.
-#include <dlfcn.h>
-
 #include <algorithm>
 #include <cmath>
 #include <cstdio>
 
 #include <gtest/gtest.h>
-#include <hotfolder/HFPlugin.h>
-#include <wx/filename.h>
-#include <wx/xml/xml.h>
 
+#include "CupsJobOptions.h"
 #include "GhostscriptOracle.h"
+#include "HostModule.h"
+#include "PageSizeKeys.h"
 #include "PpdSources.h"
 #include "SampleEps.h"
-#include "CupsJobOptions.h"
-#include "PageSizeKeys.h"
 #include "ServerFromPpd.h"
-#include "db/ConfigurationReader.h"
-#include "db/FilterConfiguration.h"
-#include "db/FolderConfiguration.h"
-#include "db/HFDatabase.h"
-#include "db/ImposeConfiguration.h"
-#include "db/JobConfiguration.h"
 #include "db/PluginInitialize.h"
-#include "db/PreflightConfiguration.h"
-#include "db/Setting.h"
+
+using hf_test::AddSetting;
 
 namespace
 {
-void AddSetting(wxXmlNode* ui, const wxString& key, const wxString& value)
-{
-    auto* node = new wxXmlNode(wxXML_ELEMENT_NODE, key);
-    node->AddChild(new wxXmlNode(wxXML_TEXT_NODE, "text", value));
-    ui->AddChild(node);
-}
-
 // Some HP descriptions select paper through a procedure set that lives in
 // the printer; Ghostscript gets a stand-in that takes the margins and does
 // nothing with them, so the rest of the command is what gets checked.
@@ -52,25 +35,14 @@ hf_test::GhostscriptReport RunOnPrinter(const wxString& psFile, const wxString& 
     return hf_test::RunGhostscriptBBox(withPrinter.ToStdString());
 }
 
-class PaperConversion : public ::testing::Test
+class PaperConversion : public hf_test::ModuleTest
 {
 protected:
     void SetUp() override
     {
         if (!hf_test::ProgramAvailable("gs"))
             GTEST_SKIP() << "Ghostscript (gs) is not installed";
-        module = dlopen(HF_MODULE_PATH, RTLD_NOW | RTLD_LOCAL);
-        ASSERT_NE(module, nullptr) << dlerror();
-        make = reinterpret_cast<GetPluginInstanceFn>(dlsym(module, "GetPluginInstance"));
-        release = reinterpret_cast<ReleasePluginInstanceFn>(dlsym(module, "ReleasePluginInstance"));
-        ASSERT_TRUE(make && release);
-    }
-    void TearDown() override
-    {
-        if (plugin)
-            release(plugin);
-        if (module)
-            dlclose(module);
+        ModuleTest::SetUp();
     }
 
     // The settings a folder has after the user picked a page, written by
@@ -79,10 +51,7 @@ protected:
     // does per folder.
     void LoadSettings(const wxString& server, const MapPropToValue& page)
     {
-        if (plugin)
-            release(plugin);
-        plugin = make(L"EPS");
-        ASSERT_NE(plugin, nullptr);
+        NewPlugin();
         ASSERT_EQ(plugin->Initialize(server), 0);
         wxXmlNode filter(wxXML_ELEMENT_NODE, "Filter");
         auto* ui = new wxXmlNode(wxXML_ELEMENT_NODE, "UI");
@@ -107,13 +76,7 @@ protected:
     {
         sample::ScratchDir hot, out;
         ASSERT_TRUE(sample::WriteFile(hot.File("art.eps"), sample::RectangleEps(0, 0, 72, 36)));
-        db::Setting setting;
-        setting.SetName("hot");
-        wxString saved;
-        db::HFDatabase::WriteFolderProperties(
-            wxFileName(out.Path(), "Folder.cfg").GetFullPath(), setting, db::JobConfiguration(),
-            db::FolderConfiguration(), db::FilterConfiguration(), db::ImposeConfiguration(),
-            db::PreflightConfiguration(), saved);
+        hf_test::WriteEmptyFolderConfig(out.File("Folder.cfg"));
 
         wxArrayString files, second, rejected;
         files.Add(hot.File("art.eps"));
@@ -124,10 +87,8 @@ protected:
         ASSERT_EQ(plugin->Process("", jobs[0], out.Path(), outputName, nullptr), 0);
         outcome.gs = RunOnPrinter(out.File(outputName), command);
 
-        db::JobConfiguration overrides;
-        db::ConfigurationReader::ReadJobConfiguration(out.File("Folder.cfg"), overrides);
         printing::OptionList pairs;
-        for (const auto& [key, property] : overrides.GetProperties())
+        for (const auto& [key, property] : hf_test::FolderOverrides(out.File("Folder.cfg")))
             pairs.emplace_back(std::string(key.utf8_str()),
                                std::string(property.GetValue().utf8_str()));
         outcome.cupsOptions = printing::CupsOptionsFromOverrides(pairs);
@@ -180,10 +141,6 @@ protected:
         return tried;
     }
 
-    void* module = nullptr;
-    HFPlugin* plugin = nullptr;
-    GetPluginInstanceFn make = nullptr;
-    ReleasePluginInstanceFn release = nullptr;
 };
 } // namespace
 

@@ -2,12 +2,13 @@
 // A second, deliberately simple reading of a PPD file's text, independent of
 // the CUPS parser: what the tests expect comes from here, what the code
 // under test produces comes from libcups.
-#include <fstream>
 #include <map>
 #include <regex>
 #include <sstream>
 #include <string>
 #include <vector>
+
+#include "GhostscriptOracle.h"
 
 namespace ppd_text
 {
@@ -72,12 +73,9 @@ inline Paper& PaperFor(Description& d, const std::string& keyword)
 // lines up to its closing quote.
 inline bool Read(const std::string& path, Description& d)
 {
-    std::ifstream in(path, std::ios::binary);
-    if (!in)
+    if (access(path.c_str(), R_OK) != 0)
         return false;
-    std::stringstream whole;
-    whole << in.rdbuf();
-    const std::string text = whole.str();
+    const std::string text = hf_test::ReadWholeFile(path);
     const bool latin1 = text.find("*LanguageEncoding: ISOLatin1") != std::string::npos;
 
     static const std::regex entry(

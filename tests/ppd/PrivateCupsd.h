@@ -12,9 +12,7 @@
 #include <unistd.h>
 
 #include <chrono>
-#include <cstdlib>
 #include <fstream>
-#include <sstream>
 #include <string>
 #include <thread>
 #include <vector>
@@ -26,21 +24,22 @@ namespace cups_test
 // Absolute path of a program in PATH or the system folders; "" when absent.
 inline std::string FindProgram(const std::string& name)
 {
-    std::string folders = std::getenv("PATH") ? std::getenv("PATH") : "";
-    folders += ":/usr/sbin:/usr/bin:/sbin:/bin";
-    std::istringstream list(folders);
-    for (std::string folder; std::getline(list, folder, ':');)
-        if (!folder.empty() && access((folder + "/" + name).c_str(), X_OK) == 0)
-            return folder + "/" + name;
-    return std::string();
+    return hf_test::FindProgram(name, "/usr/sbin:/usr/bin:/sbin:/bin");
+}
+
+inline sockaddr_in Loopback(int port)
+{
+    sockaddr_in address{};
+    address.sin_family = AF_INET;
+    address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
+    address.sin_port = htons(static_cast<uint16_t>(port));
+    return address;
 }
 
 inline int FreeLoopbackPort()
 {
     const int fd = socket(AF_INET, SOCK_STREAM, 0);
-    sockaddr_in address{};
-    address.sin_family = AF_INET;
-    address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
+    sockaddr_in address = Loopback(0);
     socklen_t size = sizeof address;
     int port = 0;
     if (bind(fd, reinterpret_cast<sockaddr*>(&address), size) == 0 &&
@@ -53,10 +52,7 @@ inline int FreeLoopbackPort()
 inline bool Accepts(int port)
 {
     const int fd = socket(AF_INET, SOCK_STREAM, 0);
-    sockaddr_in address{};
-    address.sin_family = AF_INET;
-    address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
-    address.sin_port = htons(static_cast<uint16_t>(port));
+    sockaddr_in address = Loopback(port);
     const bool ok = connect(fd, reinterpret_cast<sockaddr*>(&address), sizeof address) == 0;
     close(fd);
     return ok;
