@@ -84,7 +84,7 @@ wxString HFHelper::GetLanguageFileDirectory()
     // Without an application object there are no standard paths; the
     // parent of the user data directory is then the home directory.
     const wxString base =
-        wxTheApp
+        wxAppConsole::GetInstance()
             ? wxStandardPaths::Get().GetUserDataDir().BeforeLast(wxFileName::GetPathSeparator())
             : wxFileName::GetHomeDir();
     const wxString directory = base + wxFileName::GetPathSeparator() + "Vomal QDK";
