@@ -1,4 +1,8 @@
 // Which arriving files the filter takes as jobs.
+#include <ftw.h>
+
+#include <cstring>
+
 #include <wx/dir.h>
 #include <wx/filename.h>
 
@@ -107,19 +111,39 @@ long EPS::SniffFolder(const wxString& folder, wxArrayString& rejected, JobInfoCo
     return SniffFileList(files, rejected, jobs);
 }
 
+namespace
+{
+// Names matching "*.ppml" and "*.PPML" below the folder, in one walk.
+thread_local size_t lowerMatches = 0;
+thread_local size_t upperMatches = 0;
+
+bool EndsWith(const char* name, const char* suffix)
+{
+    const size_t n = std::strlen(name), m = std::strlen(suffix);
+    return n >= m && std::memcmp(name + n - m, suffix, m) == 0;
+}
+
+int CountPpml(const char* path, const struct stat*, int type, struct FTW* where)
+{
+    if (type == FTW_F || type == FTW_SL)
+    {
+        const char* name = path + where->base;
+        lowerMatches += EndsWith(name, ".ppml");
+        upperMatches += EndsWith(name, ".PPML");
+    }
+    return 0;
+}
+} // namespace
+
 bool EPS::IsPPMLFolder(const wxString& folder)
 {
     if (!wxDir::Exists(folder))
         return false;
-    const int flags = wxDIR_FILES | wxDIR_DIRS | wxDIR_HIDDEN;
-    wxArrayString found;
-    wxDir::GetAllFiles(folder, &found, "*.ppml", flags);
-    if (found.empty())
-        wxDir::GetAllFiles(folder, &found, "*.PPML", flags);
-    size_t count = 0;
-    for (const wxString& path : found)
-        if (path.Lower().Contains(".ppml"))
-            ++count;
-    // Exactly one PPML file makes a PPML job; several make an ordinary folder.
+    lowerMatches = upperMatches = 0;
+    nftw(folder.fn_str(), CountPpml, 32, FTW_PHYS);
+    // The upper-case spelling is looked at only when no lower-case one
+    // exists. Exactly one PPML file makes a PPML job; several make an
+    // ordinary folder.
+    const size_t count = lowerMatches > 0 ? lowerMatches : upperMatches;
     return count == 1;
 }
