@@ -2,6 +2,8 @@
 
 #include <cstdlib>
 
+#include "EngineMessages.h"
+
 namespace
 {
 // Only tests arm this, from the thread that then calls the engine.
@@ -33,4 +35,32 @@ void SetEngineAllocFailuresForTesting(int skipCount, int failCount)
 {
     allocationsToSkip = skipCount;
     allocationsToFail = failCount;
+}
+
+char* AllocateWorkBuffer(size_t largest, size_t* size)
+{
+    static const struct
+    {
+        size_t size;
+        const char* failure;
+    } steps[] = {
+        {1048576, "1MB not available from malloc; trying smaller amount\n"},
+        {65536, "64KB not available from malloc; trying smaller amount\n"},
+        {4096, "4KB not available from malloc; trying smaller amount\n"},
+        // The copy routine's words, also when the line buffer fails: callers match on it.
+        {256, "Even 256 bytes not available for copy buffer in ExtractEPSfromTIFFpreview\n"},
+    };
+    for (const auto& step : steps)
+    {
+        if (step.size > largest)
+            continue;
+        if (char* buffer = static_cast<char*>(EngineAlloc(step.size)))
+        {
+            *size = step.size;
+            return buffer;
+        }
+        WriteEngineMessage(step.failure);
+    }
+    *size = 0;
+    return nullptr;
 }

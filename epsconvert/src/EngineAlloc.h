@@ -9,3 +9,8 @@ void EngineFree(void* block);
 // Lets the next skipCount allocations succeed, then fails the failCount
 // allocations after them. failCount 0 switches the failures off.
 void SetEngineAllocFailuresForTesting(int skipCount, int failCount);
+
+// A work buffer that degrades rather than failing: tries largest (1 MB or
+// 64 KB), then 64 KB, 4 KB and 256 bytes, writing each step's message when
+// a size is not available. Null with *size 0 when even 256 bytes fail.
+char* AllocateWorkBuffer(size_t largest, size_t* size);

@@ -11,33 +11,6 @@
 
 namespace
 {
-// Large chunks keep big files to few calls; smaller ones keep the copy going
-// under memory pressure.
-char* AllocateCopyBuffer(size_t* size)
-{
-    static const struct
-    {
-        size_t size;
-        const char* failure;
-    } steps[] = {
-        {1048576, "1MB not available from malloc; trying smaller amount\n"},
-        {65536, "64KB not available from malloc; trying smaller amount\n"},
-        {4096, "4KB not available from malloc; trying smaller amount\n"},
-        {256, "Even 256 bytes not available for copy buffer in ExtractEPSfromTIFFpreview\n"},
-    };
-    for (const auto& step : steps)
-    {
-        if (char* buffer = static_cast<char*>(EngineAlloc(step.size)))
-        {
-            *size = step.size;
-            return buffer;
-        }
-        WriteEngineMessage(step.failure);
-    }
-    *size = 0;
-    return nullptr;
-}
-
 // When the whole range is present and both ends are regular files, the
 // kernel copies it without passing the bytes through user space. Anything
 // else (a truncated file, a pipe, a file system that refuses) goes through
@@ -94,7 +67,7 @@ void ExtractEPSfromTIFFpreview(FILE* in, FILE* out, long offset, long length)
     if (!in || !out)
         return;
     size_t bufferSize = 0;
-    char* buffer = AllocateCopyBuffer(&bufferSize);
+    char* buffer = AllocateWorkBuffer(1048576, &bufferSize);
     if (!buffer)
         return;
 

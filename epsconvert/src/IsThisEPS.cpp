@@ -30,32 +30,6 @@ void FillDocName(EPSinfo_t* info, const char* path)
     info->docName[sizeof info->docName - 1] = '\0';
 }
 
-// The line buffer degrades rather than failing; size 0 means none at all.
-char* AllocateLineBuffer(size_t* size)
-{
-    static const struct
-    {
-        size_t size;
-        const char* failure;
-    } steps[] = {
-        {65536, "64KB not available from malloc; trying smaller amount\n"},
-        {4096, "4KB not available from malloc; trying smaller amount\n"},
-        // The copy routine's message, word for word: callers match on it.
-        {256, "Even 256 bytes not available for copy buffer in ExtractEPSfromTIFFpreview\n"},
-    };
-    for (const auto& step : steps)
-    {
-        if (char* buffer = static_cast<char*>(EngineAlloc(step.size)))
-        {
-            *size = step.size;
-            return buffer;
-        }
-        WriteEngineMessage(step.failure);
-    }
-    *size = 0;
-    return nullptr;
-}
-
 bool IsEpsSignature(char* firstLine)
 {
     firstLine[std::strcspn(firstLine, "\r\n")] = '\0';
@@ -189,7 +163,7 @@ unsigned int IsThisEPS(const char* path, void** context)
     std::memset(info, 0, sizeof *info);
 
     size_t bufferSize = 0;
-    char* buffer = AllocateLineBuffer(&bufferSize);
+    char* buffer = AllocateWorkBuffer(65536, &bufferSize);
     if (!buffer)
     {
         EPStoPSfreeMemory(context);
