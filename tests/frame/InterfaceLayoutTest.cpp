@@ -52,14 +52,18 @@ TEST(InterfaceLayout, SlotsInHostOrder)
 
 TEST(InterfaceLayout, DescriptionRecordOrder)
 {
-    EXPECT_EQ(offsetof(PluginInfo, m_llKind), 0u);
-    EXPECT_LT(offsetof(PluginInfo, m_strVersion), offsetof(PluginInfo, m_strIdentifier));
-    EXPECT_LT(offsetof(PluginInfo, m_strIdentifier), offsetof(PluginInfo, m_strDisplayName));
-    EXPECT_LT(offsetof(PluginInfo, m_strDisplayName), offsetof(PluginInfo, m_arrExtensions));
-    EXPECT_LT(offsetof(PluginInfo, m_arrExtensions), offsetof(PluginInfo, m_strHostReserved));
-    EXPECT_EQ(offsetof(PluginInfo, m_arrRequiredServerFeatures) -
-                  offsetof(PluginInfo, m_strHostReserved),
-              sizeof(wxString));
+    // Offsets measured on an object: the record holds wx members, so it is
+    // not standard layout and offsetof is not portable on it.
+    const PluginInfo info;
+    auto at = [&info](const void* member)
+    { return static_cast<const char*>(member) - reinterpret_cast<const char*>(&info); };
+    EXPECT_EQ(at(&info.m_llKind), 0);
+    EXPECT_LT(at(&info.m_strVersion), at(&info.m_strIdentifier));
+    EXPECT_LT(at(&info.m_strIdentifier), at(&info.m_strDisplayName));
+    EXPECT_LT(at(&info.m_strDisplayName), at(&info.m_arrExtensions));
+    EXPECT_LT(at(&info.m_arrExtensions), at(&info.m_strHostReserved));
+    EXPECT_EQ(at(&info.m_arrRequiredServerFeatures) - at(&info.m_strHostReserved),
+              static_cast<ptrdiff_t>(sizeof(wxString)));
 }
 
 TEST(JobCollection, OwnsCopiesInOrder)
