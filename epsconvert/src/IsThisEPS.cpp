@@ -1,7 +1,13 @@
 // EPS detection and header scan: recognises plain EPS files and DOS EPS
 // binaries and fills the context that conversion needs.
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <cerrno>
 #include <cstdint>
 #include <cstdio>
+#include <cstdlib>
 #include <cstring>
 
 #include "CLocaleScope.h"
@@ -30,80 +36,113 @@ void FillDocName(EPSinfo_t* info, const char* path)
     info->docName[sizeof info->docName - 1] = '\0';
 }
 
+// "%!PS-Adobe", a word, blanks, then "EPSF" and at least one more character.
 bool IsEpsSignature(char* firstLine)
 {
     firstLine[std::strcspn(firstLine, "\r\n")] = '\0';
-    char last[2];
-    CLocaleScope cLocale;
-    return std::sscanf(firstLine, "%%!PS-Adobe%*[^ \t\f]%*[ \t\f]EPSF%1c", last) == 1;
+    static constexpr char kStart[] = "%!PS-Adobe";
+    if (std::strncmp(firstLine, kStart, sizeof kStart - 1) != 0)
+        return false;
+    const char* rest = firstLine + sizeof kStart - 1;
+    const size_t word = std::strcspn(rest, " \t\f");
+    if (word == 0)
+        return false;
+    rest += word;
+    const size_t blanks = std::strspn(rest, " \t\f");
+    if (blanks == 0)
+        return false;
+    rest += blanks;
+    return std::strncmp(rest, "EPSF", 4) == 0 && rest[4] != '\0';
 }
 
-// Parses one bounding-box comment; false when it lacks four numbers.
-bool ParseBox(const char* line, const char* pattern, double box[4])
+// Parses the four numbers after a bounding-box keyword of keywordLength
+// characters; false when there are fewer. Only the first 255 characters of
+// the line count.
+bool ParseBox(const char* line, size_t keywordLength, double box[4])
 {
     char copy[256];
-    copy[0] = '\0';
+    const size_t length = std::min(std::strlen(line), sizeof copy - 1);
+    std::memcpy(copy, line, length);
+    copy[length] = '\0';
     // Numbers in EPS files always use "."; parse them in the C locale.
     CLocaleScope cLocale;
-    std::sscanf(line, "%255[^\r\n]", copy);
     double values[4];
-    if (std::sscanf(copy, pattern, &values[0], &values[1], &values[2], &values[3]) != 4)
-        return false;
+    const char* next = copy + keywordLength;
+    for (double& value : values)
+    {
+        char* end = nullptr;
+        value = std::strtod(next, &end);
+        if (end == next)
+            return false;
+        next = end;
+    }
     std::memcpy(box, values, sizeof values);
     return true;
 }
 
-enum class ScanResult
+// Reads up to wanted bytes at offset without moving the stream, so that one
+// system call serves the header, the first line and the first lines of
+// comments. False on a read error; *got is short only at the end of the file.
+bool ReadAt(FILE* file, int64_t offset, char* dest, size_t wanted, size_t* got)
 {
-    Accepted,
-    Rejected
-};
-
-ScanResult ScanHeader(EPSinfo_t* info, char* buffer, size_t size)
-{
-    LineReader reader(info->epsFile, buffer, size);
-    int linesRead = 0;
-    while (linesRead + static_cast<int>(reader.DroppedPieces()) < kMaxHeaderLines)
+    const int fd = fileno(file);
+    size_t total = 0;
+    while (total < wanted)
     {
-        const char* line = reader.Next();
-        if (!line)
-            break;
-        ++linesRead;
-        if (line[0] != '%' || line[1] != '%')
+        const ssize_t n = pread(fd, dest + total, wanted - total,
+                                static_cast<off_t>(offset) + static_cast<off_t>(total));
+        if (n < 0 && errno == EINTR)
             continue;
-        if (std::strncmp(line, "%%BoundingBox:", 14) == 0)
-        {
-            if (!ParseBox(line, "%%%%BoundingBox: %lf %lf %lf %lf", info->boundingBox))
-                return ScanResult::Rejected;
-        }
-        else if (std::strncmp(line, "%%HiResBoundingBox:", 19) == 0)
-        {
-            if (!ParseBox(line, "%%%%HiResBoundingBox: %lf %lf %lf %lf", info->boundingBox))
-                return ScanResult::Rejected;
-            break;
-        }
-        else if (std::strncmp(line, "%%EndComments", 13) == 0)
+        if (n < 0)
+            return false;
+        total += static_cast<size_t>(n);
+        // Files end reads short; asking again would only confirm it.
+        if (n == 0 || total < wanted)
             break;
     }
-    return ScanResult::Accepted;
+    *got = total;
+    return true;
 }
 
-// Finds the PostScript program and checks its signature; false rejects.
-bool LocateProgram(EPSinfo_t* info)
+// The size of the whole file: the length of a plain EPS program.
+bool FileLength(FILE* file, int64_t* length)
 {
-    FILE* file = info->epsFile;
-    unsigned char header[12];
-    if (fseek(file, 0, SEEK_SET) != 0)
+    struct stat status;
+    if (fstat(fileno(file), &status) == 0 && S_ISREG(status.st_mode))
+    {
+        *length = static_cast<int64_t>(status.st_size);
+        return true;
+    }
+    // Not a regular file: ask the stream, which says whether it can seek.
+    if (fseek(file, 0, SEEK_END) != 0)
     {
         WriteEngineMessage("Error from fseek in IsThisEPS\n");
         return false;
     }
-    if (fread(header, 1, sizeof header, file) != sizeof header)
+    const long end = ftell(file);
+    if (end == -1)
     {
-        if (ferror(file))
-            WriteEngineMessage("Error from fread of header in IsThisEPS\n");
+        WriteEngineMessage("Error from ftell in IsThisEPS\n");
         return false;
     }
+    *length = end;
+    return true;
+}
+
+// The first bytes of the file as read into the work buffer.
+struct Head
+{
+    char* bytes;
+    size_t capacity; // what a fill asks for: the buffer size less the sentinel
+    size_t got;      // fewer than capacity only when the file ended
+};
+
+// Finds the PostScript program and checks its signature; false rejects.
+bool LocateProgram(EPSinfo_t* info, const Head& head)
+{
+    const auto* header = reinterpret_cast<const unsigned char*>(head.bytes);
+    if (head.got < 12)
+        return false;
 
     if (std::memcmp(header, kDosEpsMagic, sizeof kDosEpsMagic) == 0)
     {
@@ -116,36 +155,70 @@ bool LocateProgram(EPSinfo_t* info)
             return false;
         }
     }
-    else
+    else if (head.got < head.capacity)
+        info->psLength = static_cast<int64_t>(head.got); // the whole file is in the head
+    else if (!FileLength(info->epsFile, &info->psLength))
     {
-        if (fseek(file, 0, SEEK_END) != 0)
-        {
-            WriteEngineMessage("Error from fseek in IsThisEPS\n");
-            return false;
-        }
-        info->psLength = ftell(file);
-        if (info->psLength == -1)
-        {
-            WriteEngineMessage("Error from ftell in IsThisEPS\n");
-            info->psLength = 0;
-            return false;
-        }
-    }
-
-    if (fseek(file, static_cast<long>(info->psOffset), SEEK_SET) != 0)
-    {
-        WriteEngineMessage("Error from fseek in IsThisEPS\n");
+        info->psLength = 0;
         return false;
     }
+
     char firstLine[kFirstLineBytes + 1];
-    const size_t got = fread(firstLine, 1, kFirstLineBytes, file);
-    if (got < kFirstLineBytes && ferror(file))
+    size_t got = 0;
+    const auto offset = static_cast<size_t>(info->psOffset);
+    const bool inHead = offset + kFirstLineBytes <= head.got || head.got < head.capacity;
+    if (inHead)
+    {
+        got = offset < head.got ? std::min(kFirstLineBytes, head.got - offset) : 0;
+        if (got > 0)
+            std::memcpy(firstLine, head.bytes + offset, got);
+    }
+    else if (!ReadAt(info->epsFile, info->psOffset, firstLine, kFirstLineBytes, &got))
     {
         WriteEngineMessage("Error from fread in IsThisEPS\n");
         return false;
     }
     firstLine[got] = '\0';
     return IsEpsSignature(firstLine);
+}
+
+// Scans the header comments for the bounding box; false rejects.
+bool ScanHeader(EPSinfo_t* info, Head& head)
+{
+    // The head already holds the first fill when the program starts the file.
+    size_t preloaded = head.got;
+    if (info->psOffset != 0 &&
+        !ReadAt(info->epsFile, info->psOffset, head.bytes, head.capacity, &preloaded))
+    {
+        WriteEngineMessage("IOfread error in readline()\n");
+        return true; // a scan that cannot read ends without a box, as at the end of the file
+    }
+    LineReader reader(info->epsFile, head.bytes, head.capacity + 2, preloaded,
+                      static_cast<long>(info->psOffset + preloaded));
+    int linesRead = 0;
+    while (linesRead + static_cast<int>(reader.DroppedPieces()) < kMaxHeaderLines)
+    {
+        const char* line = reader.Next();
+        if (!line)
+            break;
+        ++linesRead;
+        if (line[0] != '%' || line[1] != '%')
+            continue;
+        if (std::strncmp(line, "%%BoundingBox:", 14) == 0)
+        {
+            if (!ParseBox(line, 14, info->boundingBox))
+                return false;
+        }
+        else if (std::strncmp(line, "%%HiResBoundingBox:", 19) == 0)
+        {
+            if (!ParseBox(line, 19, info->boundingBox))
+                return false;
+            break;
+        }
+        else if (std::strncmp(line, "%%EndComments", 13) == 0)
+            break;
+    }
+    return true;
 }
 } // namespace
 
@@ -175,15 +248,13 @@ unsigned int IsThisEPS(const char* path, void** context)
     {
         FillDocName(info, path);
         info->epsFile = fopen(path, "rb");
+        Head head{buffer, bufferSize - 2, 0};
         if (!info->epsFile)
             WriteEngineMessage("Error from fopen in IsThisEPS\n");
-        else if (LocateProgram(info))
-        {
-            if (fseek(info->epsFile, static_cast<long>(info->psOffset), SEEK_SET) != 0)
-                WriteEngineMessage("Error from fseek in IsThisEPS\n");
-            else if (ScanHeader(info, buffer, bufferSize) == ScanResult::Accepted)
-                result = 1;
-        }
+        else if (!ReadAt(info->epsFile, 0, head.bytes, head.capacity, &head.got))
+            WriteEngineMessage("Error from fread of header in IsThisEPS\n");
+        else if (LocateProgram(info, head) && ScanHeader(info, head))
+            result = 1;
     }
     else
         WriteEngineMessage("Error from fopen in IsThisEPS\n");

@@ -23,8 +23,25 @@ LineReader::LineReader(FILE* stream, char* buffer, size_t size)
     m_buffer[1] = '\0';
 }
 
+LineReader::LineReader(FILE* stream, char* buffer, size_t size, size_t preloaded, long streamOffset)
+    : m_stream(stream), m_buffer(buffer), m_size(size), m_end(preloaded),
+      m_atEof(preloaded < size - 2), m_seekTo(streamOffset)
+{
+    m_buffer[m_end] = '\n';
+    m_buffer[m_end + 1] = '\0';
+}
+
 LineReader::Fill LineReader::Refill(size_t keep)
 {
+    if (m_seekTo >= 0)
+    {
+        if (fseek(m_stream, m_seekTo, SEEK_SET) != 0)
+        {
+            WriteEngineMessage("IOfread error in readline()\n");
+            return Fill::End;
+        }
+        m_seekTo = -1;
+    }
     if (keep > 0 && m_pos > 0)
         std::memmove(m_buffer, m_buffer + m_pos, keep);
     m_pos = 0;

@@ -11,6 +11,11 @@ public:
     // buffer must hold size bytes (at least 8) and outlive the reader.
     LineReader(FILE* stream, char* buffer, size_t size);
 
+    // As above, with the first fill already done by the caller: buffer holds
+    // `preloaded` bytes, as many as a fill asks for (size - 2) unless the
+    // file ended. Further reads continue at streamOffset.
+    LineReader(FILE* stream, char* buffer, size_t size, size_t preloaded, long streamOffset);
+
     // The next line, NUL-terminated, pointing into the buffer and valid until
     // the next call; null when the scan has to end (end of file or a read
     // error, which is reported on standard error).
@@ -35,4 +40,5 @@ private:
     size_t m_end = 0; // end of the data read; an LF and a NUL sit behind it
     bool m_atEof = false;
     size_t m_droppedPieces = 0;
+    long m_seekTo = -1; // where the stream must be before the next read, if anywhere
 };

@@ -1,4 +1,5 @@
 #pragma once
+#include <string>
 #include <vector>
 
 #include <hotfolder/HFPlugin.h>
@@ -73,9 +74,11 @@ private:
         NotEPS,
         Accepted
     };
-    SniffResult SniffOne(const wxString& path, const wxString& filterId, JobInfoCollection& jobs);
-    long SniffFileList(const wxArrayString& files, wxArrayString& rejected,
-                       JobInfoCollection& jobs);
+    // nativePath, when given, is path already in the file system's encoding.
+    SniffResult SniffOne(const wxString& path, const char* nativePath, const wxString& filterId,
+                         JobInfoCollection& jobs);
+    long SniffFileList(const wxArrayString& files, const std::vector<std::string>* nativePaths,
+                       wxArrayString& rejected, JobInfoCollection& jobs);
     void ReadUIElement(wxXmlNode* node);
 
     bool m_bFilterEnabled = false;

@@ -1,34 +1,55 @@
 // Which arriving files the filter takes as jobs.
-#include <ftw.h>
-
-#include <cstring>
-
 #include <wx/dir.h>
 #include <wx/filename.h>
 
 #include "EPS.h"
 #include "EPStoPS.h"
 #include "ErrorCodes.h"
+#include "FolderListing.h"
 
-EPS::SniffResult EPS::SniffOne(const wxString& path, const wxString& filterId,
-                               JobInfoCollection& jobs)
+namespace
+{
+// Whether the name's extension is "EPS" in any case. As the toolkit's file
+// names see it: the part after the last dot, unless that dot begins the name.
+bool HasEpsExtension(const wxString& name)
+{
+    const size_t dot = name.rfind('.');
+    if (dot == wxString::npos || dot == 0 || name.length() - dot != 4)
+        return false;
+    static const wxUniChar kEps[] = {'E', 'P', 'S'};
+    for (size_t i = 0; i < 3; ++i)
+        if (wxToupper(name[dot + 1 + i]) != kEps[i])
+            return false;
+    return true;
+}
+} // namespace
+
+EPS::SniffResult EPS::SniffOne(const wxString& path, const char* nativePath,
+                               const wxString& filterId, JobInfoCollection& jobs)
 {
     if (path.empty())
         return SniffResult::EmptyPath;
-    const wxFileName name(path, wxPATH_NATIVE);
-    const wxCharBuffer bytes = name.GetFullPath().fn_str();
-    if (!bytes.data() || bytes.length() == 0 || name.GetExt().CmpNoCase("EPS") != 0)
+    const wxString name = path.AfterLast('/');
+    if (!HasEpsExtension(name))
         return SniffResult::Refused;
+    wxCharBuffer converted;
+    if (!nativePath)
+    {
+        converted = path.fn_str();
+        nativePath = converted.data();
+    }
+    if (!nativePath || *nativePath == '\0')
+        return SniffResult::Refused; // not expressible as a file name here
 
     void* context = nullptr;
-    if (!IsThisEPS(bytes.data(), &context))
+    if (!IsThisEPS(nativePath, &context))
         return SniffResult::NotEPS;
     EPStoPSfreeMemory(&context);
 
-    ReadyToProcessJobInfo job;
-    job.filterId = filterId;
-    job.jobName = name.GetFullName();
-    job.files.Add(path);
+    auto* job = new ReadyToProcessJobInfo; // the collection takes it over
+    job->filterId = filterId;
+    job->jobName = name;
+    job->files.Add(path);
     jobs.Add(job);
     return SniffResult::Accepted;
 }
@@ -42,7 +63,7 @@ long EPS::SniffFiles(const wxArrayString& files, wxArrayString& second, wxArrayS
     bool accepted = false;
     for (const wxString& path : files)
     {
-        switch (SniffOne(path, filterId, jobs))
+        switch (SniffOne(path, nullptr, filterId, jobs))
         {
         case SniffResult::EmptyPath:
             return m_lStatus = HF_INPUT_FILE_NOT_FOUND;
@@ -61,19 +82,20 @@ long EPS::SniffFiles(const wxArrayString& files, wxArrayString& second, wxArrayS
     return m_lStatus = HF_NO_ERROR;
 }
 
-long EPS::SniffFileList(const wxArrayString& files, wxArrayString& rejected,
-                        JobInfoCollection& jobs)
+long EPS::SniffFileList(const wxArrayString& files, const std::vector<std::string>* nativePaths,
+                        wxArrayString& rejected, JobInfoCollection& jobs)
 {
     wxString filterId;
     GetShortName(filterId);
-    for (const wxString& path : files)
+    for (size_t i = 0; i < files.size(); ++i)
     {
-        switch (SniffOne(path, filterId, jobs))
+        const char* native = nativePaths ? (*nativePaths)[i].c_str() : nullptr;
+        switch (SniffOne(files[i], native, filterId, jobs))
         {
         case SniffResult::EmptyPath:
             return m_lStatus = HF_INPUT_FILE_NOT_FOUND;
         case SniffResult::Refused:
-            rejected.Add(path);
+            rejected.Add(files[i]);
             break;
         case SniffResult::NotEPS: // an .eps that is not EPS is dropped, not offered elsewhere
         case SniffResult::Accepted:
@@ -88,15 +110,9 @@ long EPS::SniffFolder(const wxString& folder, wxArrayString& rejected, JobInfoCo
     if (IsPPMLFolder(folder))
         return HF_NO_ERROR;
     wxArrayString files;
-    if (wxDir::Exists(folder))
-    {
-        wxDir dir(folder);
-        wxString name;
-        for (bool more = dir.IsOpened() && dir.GetFirst(&name, wxEmptyString, wxDIR_FILES); more;
-             more = dir.GetNext(&name))
-            files.Add(wxFileName(folder, name).GetFullPath());
-    }
-    return SniffFileList(files, rejected, jobs);
+    std::vector<std::string> nativePaths;
+    folder_listing::ListFiles(folder, files, nativePaths);
+    return SniffFileList(files, &nativePaths, rejected, jobs);
 }
 
 long EPS::SniffFolder(const wxString& folder, wxArrayString& rejected, JobInfoCollection& jobs,
@@ -108,42 +124,17 @@ long EPS::SniffFolder(const wxString& folder, wxArrayString& rejected, JobInfoCo
         rejected = files; // a PPML job is refused whole
         return m_lStatus = HF_NO_ERROR;
     }
-    return SniffFileList(files, rejected, jobs);
+    return SniffFileList(files, nullptr, rejected, jobs);
 }
-
-namespace
-{
-// Names matching "*.ppml" and "*.PPML" below the folder, in one walk.
-thread_local size_t lowerMatches = 0;
-thread_local size_t upperMatches = 0;
-
-bool EndsWith(const char* name, const char* suffix)
-{
-    const size_t n = std::strlen(name), m = std::strlen(suffix);
-    return n >= m && std::memcmp(name + n - m, suffix, m) == 0;
-}
-
-int CountPpml(const char* path, const struct stat*, int type, struct FTW* where)
-{
-    if (type == FTW_F || type == FTW_SL)
-    {
-        const char* name = path + where->base;
-        lowerMatches += EndsWith(name, ".ppml");
-        upperMatches += EndsWith(name, ".PPML");
-    }
-    return 0;
-}
-} // namespace
 
 bool EPS::IsPPMLFolder(const wxString& folder)
 {
     if (!wxDir::Exists(folder))
         return false;
-    lowerMatches = upperMatches = 0;
-    nftw(folder.fn_str(), CountPpml, 32, FTW_PHYS);
+    const folder_listing::NameCounts counts = folder_listing::CountPpmlNames(folder);
     // The upper-case spelling is looked at only when no lower-case one
     // exists. Exactly one PPML file makes a PPML job; several make an
     // ordinary folder.
-    const size_t count = lowerMatches > 0 ? lowerMatches : upperMatches;
+    const size_t count = counts.lower > 0 ? counts.lower : counts.upper;
     return count == 1;
 }

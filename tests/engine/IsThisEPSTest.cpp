@@ -186,6 +186,20 @@ TEST_F(Detect_, DosBinaryHeaderLocatesThePostScriptSection)
     EXPECT_EQ(past.result, 0u);
     EXPECT_EQ(past.messages, "");
 
+    // A section far behind a large preview is found too, and its header is
+    // scanned from the section's start, not from the file's.
+    const std::string preview(200000, '\n');
+    const std::string decoy = "%!PS-Adobe-3.0 EPSF-3.0\n%%BoundingBox: 9 9 9 9\n";
+    const Detection far =
+        Detect(Write("far.eps", DosEpsHeader(30 + 200000, 1000) + preview + body));
+    ASSERT_EQ(far.result, 1u);
+    ExpectBox(far.info, 10, 20, 30, 40);
+    std::string early = DosEpsHeader(30 + 100, 1000) + decoy;
+    early.resize(30 + 100, ' ');
+    const Detection shifted = Detect(Write("shifted.eps", early + body));
+    ASSERT_EQ(shifted.result, 1u);
+    ExpectBox(shifted.info, 10, 20, 30, 40);
+
     // The largest length is taken as it is; copying finds out later.
     const Detection huge = Detect(Write("huge.eps", DosEpsHeader(30, 0xFFFFFFFFu) + body));
     ASSERT_EQ(huge.result, 1u);

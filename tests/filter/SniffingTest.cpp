@@ -1,4 +1,6 @@
 // Which files become jobs, which go back to the host, which are dropped.
+#include <unistd.h>
+
 #include <gtest/gtest.h>
 
 #include "EPS.h"
@@ -133,4 +135,46 @@ TEST_F(Folder, PpmlJobsAreLeftAloneOrRefusedWhole)
     Text("other.PPML", "<PPML/>");
     EXPECT_FALSE(eps.IsPPMLFolder(dir.Path()));
     EXPECT_FALSE(eps.IsPPMLFolder(dir.File("missing")));
+}
+
+TEST_F(Folder, ListingSkipsHiddenNamesAndFolderLinksButFollowsFileLinks)
+{
+    Eps(".hidden.eps");
+    const wxString target = Eps("target.eps");
+    const wxString link = dir.File("link.eps");
+    ASSERT_EQ(symlink(target.fn_str(), link.fn_str()), 0);
+    dir.Sub("folder.eps");
+    ASSERT_EQ(symlink(dir.File("folder.eps").fn_str(), dir.File("dirlink.eps").fn_str()), 0);
+    const wxString dangling = dir.File("dangling.txt");
+    ASSERT_EQ(symlink("nowhere", dangling.fn_str()), 0);
+
+    wxArrayString rejected;
+    JobInfoCollection jobs;
+    EXPECT_EQ(eps.SniffFolder(dir.Path() + "/", rejected, jobs), 0);
+    wxArrayString names;
+    for (size_t i = 0; i < jobs.GetCount(); ++i)
+        names.Add(jobs[i].files[0]);
+    names.Sort();
+    EXPECT_EQ(names, List({link, target}));
+    EXPECT_EQ(rejected, List({dangling}));
+}
+
+TEST_F(Folder, PpmlNamesCountAtAnyDepthLowerCaseFirstAndLinksUnfollowed)
+{
+    // Deeper than any limit on open folders; lower case outranks upper case.
+    wxString deep = "d";
+    for (int level = 0; level < 60; ++level)
+        deep += "/d";
+    dir.Sub(deep);
+    Text(deep + "/.job.ppml", "<PPML/>");
+    Text("one.PPML", "<PPML/>");
+    Text("two.PPML", "<PPML/>");
+    dir.Sub("folder.ppml"); // a folder is not a PPML file
+    EXPECT_TRUE(eps.IsPPMLFolder(dir.Path()));
+
+    // A link counts by its own name; the folder it points to is not entered.
+    ASSERT_EQ(symlink(dir.File("d").fn_str(), dir.File("d-link").fn_str()), 0);
+    EXPECT_TRUE(eps.IsPPMLFolder(dir.Path()));
+    ASSERT_EQ(symlink("nowhere", dir.File("link.ppml").fn_str()), 0);
+    EXPECT_FALSE(eps.IsPPMLFolder(dir.Path()));
 }
