@@ -56,11 +56,23 @@ bool FocusFor(wxWindow* field)
     return wxWindow::FindFocus() == field;
 }
 
-void TypeKeys(const char* keys)
+// Types keys into the focused field and returns once the field has seen
+// every key come back up, so a busy display cannot leave keys in flight.
+// False when they did not all arrive within ten seconds.
+bool TypeKeys(wxWindow* field, const std::string& keys)
 {
-    wxUIActionSimulator simulator;
-    simulator.Text(keys);
-    Pump(150);
+    size_t released = 0;
+    auto count = [&released](wxKeyEvent& event)
+    {
+        ++released;
+        event.Skip();
+    };
+    field->Bind(wxEVT_KEY_UP, count);
+    wxUIActionSimulator().Text(keys.c_str());
+    for (int i = 0; i < 400 && released < keys.size(); ++i)
+        Pump(25);
+    field->Unbind(wxEVT_KEY_UP, count);
+    return released >= keys.size();
 }
 } // namespace
 
@@ -134,10 +146,10 @@ TEST_F(CustomDialog, TypedKeysAboveTheMaximumOrNotNumbersAreUndone)
     if (!FocusFor(width))
         GTEST_SKIP() << "the display gives no keyboard focus";
     width->Clear();
-    TypeKeys("1001");
+    ASSERT_TRUE(TypeKeys(width, "1001"));
     EXPECT_EQ("100", width->GetValue());
     width->Clear();
-    TypeKeys("7x2.255");
+    ASSERT_TRUE(TypeKeys(width, "7x2.255"));
     EXPECT_EQ("72.25", width->GetValue());
 }
 
