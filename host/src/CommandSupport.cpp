@@ -1,8 +1,12 @@
 #include <cstdio>
 
+#include <wx/filename.h>
+
 #include "CommandLine.h"
 #include "Commands.h"
 #include "ConsoleText.h"
+#include "HotFolder.h"
+#include "ServerDescription.h"
 
 bool ParseCommandLine(const Arguments& args, std::vector<OptionSpec> specs, const char* usage,
                       size_t minPositionals, size_t maxPositionals, ParsedArgs& parsed,
@@ -30,6 +34,24 @@ bool ParseCommandLine(const Arguments& args, std::vector<OptionSpec> specs, cons
                                                               : "too many arguments");
         std::fputs(usage, stderr);
         exitStatus = kExitUsage;
+        return false;
+    }
+    return true;
+}
+
+bool OpenFolderAndServer(const std::string& folderArgument, HotFolder& folder,
+                         ServerDescription& server)
+{
+    wxString error;
+    if (!folder.Open(FromUtf8(folderArgument), error))
+    {
+        PrintError(error);
+        return false;
+    }
+    if (wxFileName::FileExists(folder.GetServerDescriptionFile()) &&
+        !server.Load(folder.GetServerDescriptionFile(), error))
+    {
+        PrintError(error);
         return false;
     }
     return true;

@@ -198,18 +198,9 @@ int RunRunCommand(const Arguments& args)
     }
 
     HotFolder folder;
-    if (!folder.Open(FromUtf8(parsed.positionals[0]), error))
-    {
-        PrintError(error);
-        return kExitSetupFailed;
-    }
     ServerDescription server;
-    if (wxFileName::FileExists(folder.GetServerDescriptionFile()) &&
-        !server.Load(folder.GetServerDescriptionFile(), error))
-    {
-        PrintError(error);
+    if (!OpenFolderAndServer(parsed.positionals[0], folder, server))
         return kExitSetupFailed;
-    }
 
     JobPlaces places;
     places.configFile = folder.GetConfigFile();

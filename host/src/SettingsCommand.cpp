@@ -216,18 +216,9 @@ int RunSettingsCommand(int argc, char** argv, const Arguments& args)
 
     wxString error;
     HotFolder folder;
-    if (!folder.Open(FromUtf8(parsed.positionals[0]), error))
-    {
-        PrintError(error);
-        return kExitSetupFailed;
-    }
     ServerDescription server;
-    if (wxFileName::FileExists(folder.GetServerDescriptionFile()) &&
-        !server.Load(folder.GetServerDescriptionFile(), error))
-    {
-        PrintError(error);
+    if (!OpenFolderAndServer(parsed.positionals[0], folder, server))
         return kExitSetupFailed;
-    }
     const wxString modulePath = LocateFilterModule(FromUtf8(parsed.Get("--module")));
     if (windowed)
         return EditInWindow(folder, modulePath, server, parsed.Has("--accept"));
