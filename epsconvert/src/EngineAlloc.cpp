@@ -1,6 +1,7 @@
 #include "EngineAlloc.h"
 
 #include <cstdlib>
+#include <utility>
 
 #include "EngineMessages.h"
 
@@ -9,6 +10,18 @@ namespace
 // Only tests arm this, from the thread that then calls the engine.
 thread_local int allocationsToSkip = 0;
 thread_local int allocationsToFail = 0;
+
+// One released work buffer of up to 64 KB kept per thread: detection runs
+// once for every arriving file, and a fresh 64 KB from malloc each time
+// costs more than the scan of a typical header.
+constexpr size_t kLargestKept = 65536;
+struct KeptBuffer
+{
+    char* block = nullptr;
+    size_t size = 0;
+    ~KeptBuffer() { std::free(block); }
+};
+thread_local KeptBuffer kept;
 } // namespace
 
 void* EngineAlloc(size_t size)
@@ -54,6 +67,13 @@ char* AllocateWorkBuffer(size_t largest, size_t* size)
     {
         if (step.size > largest)
             continue;
+        // A kept buffer serves a request of its own size, but never while a
+        // test is making allocations fail.
+        if (kept.block && kept.size == step.size && allocationsToFail == 0)
+        {
+            *size = kept.size;
+            return std::exchange(kept.block, nullptr);
+        }
         if (char* buffer = static_cast<char*>(EngineAlloc(step.size)))
         {
             *size = step.size;
@@ -63,4 +83,15 @@ char* AllocateWorkBuffer(size_t largest, size_t* size)
     }
     *size = 0;
     return nullptr;
+}
+
+void ReleaseWorkBuffer(char* buffer, size_t size)
+{
+    if (buffer && !kept.block && size <= kLargestKept)
+    {
+        kept.block = buffer;
+        kept.size = size;
+        return;
+    }
+    EngineFree(buffer);
 }

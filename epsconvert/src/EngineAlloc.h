@@ -14,3 +14,6 @@ void SetEngineAllocFailuresForTesting(int skipCount, int failCount);
 // 64 KB), then 64 KB, 4 KB and 256 bytes, writing each step's message when
 // a size is not available. Null with *size 0 when even 256 bytes fail.
 char* AllocateWorkBuffer(size_t largest, size_t* size);
+
+// Gives back a buffer from AllocateWorkBuffer with the size it reported.
+void ReleaseWorkBuffer(char* buffer, size_t size);

@@ -74,7 +74,7 @@ void ExtractEPSfromTIFFpreview(FILE* in, FILE* out, long offset, long length)
     if (fseek(in, offset, SEEK_SET) != 0)
     {
         WriteEngineMessage("Error from fseek in ExtractEPSfromTIFFpreview\n");
-        EngineFree(buffer);
+        ReleaseWorkBuffer(buffer, bufferSize);
         return;
     }
 
@@ -99,5 +99,5 @@ void ExtractEPSfromTIFFpreview(FILE* in, FILE* out, long offset, long length)
             break;
         }
     }
-    EngineFree(buffer);
+    ReleaseWorkBuffer(buffer, bufferSize);
 }

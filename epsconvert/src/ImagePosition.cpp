@@ -5,11 +5,11 @@
 FilterImgPosition_t ConvertToImgPos(ImagePosition_t position)
 {
     static const FilterImgPosition_t table[] = {
-        FILTER_IMG_POS_BOTTOM_LEFT, // IMG_POS_BOTTOM_LEFT
-        FILTER_IMG_POS_TOP_LEFT,    // IMG_POS_TOP_LEFT
-        FILTER_IMG_POS_TOP_RIGHT,   // IMG_POS_TOP_RIGHT
+        FILTER_IMG_POS_BOTTOM_LEFT,  // IMG_POS_BOTTOM_LEFT
+        FILTER_IMG_POS_TOP_LEFT,     // IMG_POS_TOP_LEFT
+        FILTER_IMG_POS_TOP_RIGHT,    // IMG_POS_TOP_RIGHT
         FILTER_IMG_POS_BOTTOM_RIGHT, // IMG_POS_BOTTOM_RIGHT
-        FILTER_IMG_POS_CENTER,      // IMG_POS_CENTER
+        FILTER_IMG_POS_CENTER,       // IMG_POS_CENTER
     };
     // Out of range maps to top right, not to the centre: kept as hosts expect.
     return position <= IMG_POS_CENTER ? table[position] : FILTER_IMG_POS_TOP_RIGHT;

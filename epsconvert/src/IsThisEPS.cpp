@@ -55,6 +55,37 @@ bool IsEpsSignature(char* firstLine)
     return std::strncmp(rest, "EPSF", 4) == 0 && rest[4] != '\0';
 }
 
+// Reads one number as strtod does in the C locale. Boxes mostly hold small
+// integers: those are read here directly, exactly and several times faster;
+// anything else goes to strtod. False when no number is there.
+bool ReadNumber(const char*& next, double& value)
+{
+    const char* p = next;
+    while (*p == ' ' || (*p >= '\t' && *p <= '\r'))
+        ++p;
+    const bool negative = *p == '-';
+    if (*p == '-' || *p == '+')
+        ++p;
+    long long whole = 0;
+    int digits = 0;
+    for (; *p >= '0' && *p <= '9' && digits < 15; ++p, ++digits)
+        whole = whole * 10 + (*p - '0');
+    // strtod would read on into a fraction, an exponent or a hex number.
+    const bool numberEnds = *p == '\0' || !std::strchr("0123456789.eExX", *p);
+    if (digits > 0 && numberEnds)
+    {
+        value = negative ? -static_cast<double>(whole) : static_cast<double>(whole);
+        next = p;
+        return true;
+    }
+    char* end = nullptr;
+    value = std::strtod(next, &end);
+    if (end == next)
+        return false;
+    next = end;
+    return true;
+}
+
 // Parses the four numbers after a bounding-box keyword of keywordLength
 // characters; false when there are fewer. Only the first 255 characters of
 // the line count.
@@ -69,13 +100,8 @@ bool ParseBox(const char* line, size_t keywordLength, double box[4])
     double values[4];
     const char* next = copy + keywordLength;
     for (double& value : values)
-    {
-        char* end = nullptr;
-        value = std::strtod(next, &end);
-        if (end == next)
+        if (!ReadNumber(next, value))
             return false;
-        next = end;
-    }
     std::memcpy(box, values, sizeof values);
     return true;
 }
@@ -259,7 +285,7 @@ unsigned int IsThisEPS(const char* path, void** context)
     else
         WriteEngineMessage("Error from fopen in IsThisEPS\n");
 
-    EngineFree(buffer);
+    ReleaseWorkBuffer(buffer, bufferSize);
     if (!result)
         EPStoPSfreeMemory(context);
     return result;

@@ -90,8 +90,9 @@ const char* LineReader::Next()
                 return nullptr;
             }
             char* start = m_buffer + m_pos;
+            // The LF sentinel behind the data ends the scan at the latest.
             size_t length = 0;
-            while (m_pos + length < m_end && !IsLineBreak(start[length]))
+            while (!IsLineBreak(start[length]))
                 ++length;
             // A line ended only by the sentinel behind the data is complete
             // only when the file has no more to give.

@@ -12,7 +12,10 @@ void InitLinkedList(LinkedList* list, ListDisposeProc dispose)
     list->dispose = dispose;
 }
 
-uint64_t GetNumberOfItems(const LinkedList* list) { return list ? list->count : 0; }
+uint64_t GetNumberOfItems(const LinkedList* list)
+{
+    return list ? list->count : 0;
+}
 
 int16_t AddToTail(LinkedList* list, void* item)
 {
@@ -98,4 +101,7 @@ void Next(ListIterator* iterator)
         *iterator = (*iterator)->next;
 }
 
-void* GetData(const ListNode* node) { return node ? node->data : nullptr; }
+void* GetData(const ListNode* node)
+{
+    return node ? node->data : nullptr;
+}

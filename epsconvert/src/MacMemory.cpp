@@ -21,6 +21,12 @@ void DisposePtr(void* block)
     lastError = noErr;
 }
 
-int16_t MemError() { return lastError; }
+int16_t MemError()
+{
+    return lastError;
+}
 
-void SetNewPtrFailureForTesting(bool fail) { failNext = fail; }
+void SetNewPtrFailureForTesting(bool fail)
+{
+    failNext = fail;
+}

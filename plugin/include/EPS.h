@@ -1,5 +1,4 @@
 #pragma once
-#include <string>
 #include <vector>
 
 #include <hotfolder/HFPlugin.h>
@@ -77,8 +76,8 @@ private:
     // nativePath, when given, is path already in the file system's encoding.
     SniffResult SniffOne(const wxString& path, const char* nativePath, const wxString& filterId,
                          JobInfoCollection& jobs);
-    long SniffFileList(const wxArrayString& files, const std::vector<std::string>* nativePaths,
-                       wxArrayString& rejected, JobInfoCollection& jobs);
+    long SniffFileList(const wxArrayString& files, wxArrayString& rejected,
+                       JobInfoCollection& jobs);
     void ReadUIElement(wxXmlNode* node);
 
     bool m_bFilterEnabled = false;

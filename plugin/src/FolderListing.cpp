@@ -2,6 +2,7 @@
 
 #include <dirent.h>
 #include <fcntl.h>
+#include <limits.h>
 #include <sys/stat.h>
 
 #include <cstring>
@@ -36,33 +37,57 @@ bool IsDirectory(DIR* dir, const dirent* entry, bool follow)
     return fstatat(dirfd(dir), entry->d_name, &status, follow ? 0 : AT_SYMLINK_NOFOLLOW) == 0 &&
            S_ISDIR(status.st_mode);
 }
+// prefix followed by the name. ASCII reads the same in every file-name
+// encoding and is copied a byte a character; other names go through the
+// converter, which costs many times more.
+wxString JoinName(const wxString& prefix, const std::string& name)
+{
+    wchar_t wide[NAME_MAX + 1];
+    if (name.size() > NAME_MAX)
+        return prefix + wxString(name.c_str(), *wxConvFileName);
+    for (size_t i = 0; i < name.size(); ++i)
+    {
+        const auto c = static_cast<unsigned char>(name[i]);
+        if (c >= 0x80)
+        {
+            const wxString converted(name.c_str(), *wxConvFileName);
+            return converted.empty() ? wxString() : prefix + converted;
+        }
+        wide[i] = static_cast<wchar_t>(c);
+    }
+    wxString path;
+    path.reserve(prefix.length() + name.size());
+    path.append(prefix);
+    path.append(wide, name.size());
+    return path;
+}
 } // namespace
 
-void ListFiles(const wxString& folder, wxArrayString& files, std::vector<std::string>& nativePaths)
+void ForEachFile(const wxString& folder,
+                 const std::function<void(const wxString& path, const char* nativePath)>& visit)
 {
     const wxCharBuffer nativeFolder = folder.fn_str();
     DIR* dir = nativeFolder.data() ? opendir(nativeFolder.data()) : nullptr;
     if (!dir)
         return;
-    const wxString prefix = folder.EndsWith("/") ? folder : folder + "/";
-    const std::string nativePrefix =
-        std::string(nativeFolder.data()) + (folder.EndsWith("/") ? "" : "/");
     std::vector<std::string> names;
     while (const dirent* entry = readdir(dir))
         if (entry->d_name[0] != '.' && !IsDirectory(dir, entry, true))
             names.emplace_back(entry->d_name);
     closedir(dir);
 
-    // Sized once: growing a wxArrayString copies every string in it.
-    files.Alloc(files.size() + names.size());
-    nativePaths.reserve(nativePaths.size() + names.size());
-    for (const std::string& nativeName : names)
+    const bool endsInSlash = folder.EndsWith("/");
+    const wxString prefix = endsInSlash ? folder : folder + "/";
+    std::string nativePath = std::string(nativeFolder.data()) + (endsInSlash ? "" : "/");
+    const size_t nativePrefixLength = nativePath.size();
+    for (const std::string& name : names)
     {
-        const wxString name(nativeName.c_str(), *wxConvFileName);
-        if (name.empty())
+        const wxString path = JoinName(prefix, name);
+        if (path.empty())
             continue; // a name the toolkit cannot represent
-        files.Add(prefix + name);
-        nativePaths.push_back(nativePrefix + nativeName);
+        nativePath.resize(nativePrefixLength);
+        nativePath += name;
+        visit(path, nativePath.c_str());
     }
 }
 

@@ -3,19 +3,18 @@
 // entry types readdir gives spare a stat call per file, which for folders
 // of thousands of files is most of the cost.
 #include <cstddef>
-#include <string>
-#include <vector>
+#include <functional>
 
-#include <wx/arrstr.h>
 #include <wx/string.h>
 
 namespace folder_listing
 {
-// The files directly in folder, as wxDir lists them with wxDIR_FILES: no
-// hidden names, no directories (a link counts as what it points to).
-// Full paths, in directory order, and the same paths in the file system's
-// own encoding.
-void ListFiles(const wxString& folder, wxArrayString& files, std::vector<std::string>& nativePaths);
+// Calls visit(path, nativePath) for every file directly in folder, as wxDir
+// lists them with wxDIR_FILES: no hidden names, no directories (a link
+// counts as what it points to). In directory order; nativePath is the same
+// path in the file system's own encoding. Both are valid during the call.
+void ForEachFile(const wxString& folder,
+                 const std::function<void(const wxString& path, const char* nativePath)>& visit);
 
 struct NameCounts
 {

@@ -1,4 +1,6 @@
 // Which arriving files the filter takes as jobs.
+#include <utility>
+
 #include <wx/dir.h>
 #include <wx/filename.h>
 
@@ -29,7 +31,7 @@ EPS::SniffResult EPS::SniffOne(const wxString& path, const char* nativePath,
 {
     if (path.empty())
         return SniffResult::EmptyPath;
-    const wxString name = path.AfterLast('/');
+    wxString name = path.AfterLast('/');
     if (!HasEpsExtension(name))
         return SniffResult::Refused;
     wxCharBuffer converted;
@@ -48,7 +50,8 @@ EPS::SniffResult EPS::SniffOne(const wxString& path, const char* nativePath,
 
     auto* job = new ReadyToProcessJobInfo; // the collection takes it over
     job->filterId = filterId;
-    job->jobName = name;
+    job->jobName = std::move(name);
+    job->files.Alloc(1); // a first Add would make room for sixteen
     job->files.Add(path);
     jobs.Add(job);
     return SniffResult::Accepted;
@@ -82,20 +85,19 @@ long EPS::SniffFiles(const wxArrayString& files, wxArrayString& second, wxArrayS
     return m_lStatus = HF_NO_ERROR;
 }
 
-long EPS::SniffFileList(const wxArrayString& files, const std::vector<std::string>* nativePaths,
-                        wxArrayString& rejected, JobInfoCollection& jobs)
+long EPS::SniffFileList(const wxArrayString& files, wxArrayString& rejected,
+                        JobInfoCollection& jobs)
 {
     wxString filterId;
     GetShortName(filterId);
-    for (size_t i = 0; i < files.size(); ++i)
+    for (const wxString& path : files)
     {
-        const char* native = nativePaths ? (*nativePaths)[i].c_str() : nullptr;
-        switch (SniffOne(files[i], native, filterId, jobs))
+        switch (SniffOne(path, nullptr, filterId, jobs))
         {
         case SniffResult::EmptyPath:
             return m_lStatus = HF_INPUT_FILE_NOT_FOUND;
         case SniffResult::Refused:
-            rejected.Add(files[i]);
+            rejected.Add(path);
             break;
         case SniffResult::NotEPS: // an .eps that is not EPS is dropped, not offered elsewhere
         case SniffResult::Accepted:
@@ -109,10 +111,17 @@ long EPS::SniffFolder(const wxString& folder, wxArrayString& rejected, JobInfoCo
 {
     if (IsPPMLFolder(folder))
         return HF_NO_ERROR;
-    wxArrayString files;
-    std::vector<std::string> nativePaths;
-    folder_listing::ListFiles(folder, files, nativePaths);
-    return SniffFileList(files, &nativePaths, rejected, jobs);
+    wxString filterId;
+    GetShortName(filterId);
+    // Straight from the listing: no list of every path is built first.
+    folder_listing::ForEachFile(folder,
+                                [&](const wxString& path, const char* nativePath)
+                                {
+                                    if (SniffOne(path, nativePath, filterId, jobs) ==
+                                        SniffResult::Refused)
+                                        rejected.Add(path);
+                                });
+    return m_lStatus = HF_NO_ERROR;
 }
 
 long EPS::SniffFolder(const wxString& folder, wxArrayString& rejected, JobInfoCollection& jobs,
@@ -124,7 +133,7 @@ long EPS::SniffFolder(const wxString& folder, wxArrayString& rejected, JobInfoCo
         rejected = files; // a PPML job is refused whole
         return m_lStatus = HF_NO_ERROR;
     }
-    return SniffFileList(files, nullptr, rejected, jobs);
+    return SniffFileList(files, rejected, jobs);
 }
 
 bool EPS::IsPPMLFolder(const wxString& folder)
