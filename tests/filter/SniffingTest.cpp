@@ -1,6 +1,8 @@
 // Which files become jobs, which go back to the host, which are dropped.
 #include <unistd.h>
 
+#include <cstdio>
+
 #include <gtest/gtest.h>
 
 #include "EPS.h"
@@ -177,4 +179,25 @@ TEST_F(Folder, PpmlNamesCountAtAnyDepthLowerCaseFirstAndLinksUnfollowed)
     EXPECT_TRUE(eps.IsPPMLFolder(dir.Path()));
     ASSERT_EQ(symlink("nowhere", dir.File("link.ppml").fn_str()), 0);
     EXPECT_FALSE(eps.IsPPMLFolder(dir.Path()));
+}
+
+TEST_F(Folder, ListingKeepsNamesBeyondAscii)
+{
+    const wxString name = wxString::FromUTF8("Gr\xc3\xbc\xc3\x9f"
+                                             "e-\xc3\xb1.eps");
+    const wxString path = Eps(name);
+    // Bytes that are no text in any encoding: never a crash, never a job.
+    const std::string raw = std::string(dir.Path().fn_str()) + "/\xff\xfe.eps";
+    FILE* file = std::fopen(raw.c_str(), "w");
+    ASSERT_NE(file, nullptr);
+    std::fputs("not an EPS file\n", file);
+    std::fclose(file);
+
+    wxArrayString rejected;
+    JobInfoCollection jobs;
+    EXPECT_EQ(eps.SniffFolder(dir.Path(), rejected, jobs), 0);
+    ASSERT_EQ(jobs.GetCount(), 1u);
+    EXPECT_EQ(jobs[0].jobName, name);
+    EXPECT_EQ(jobs[0].files[0], path);
+    EXPECT_TRUE(rejected.empty());
 }
