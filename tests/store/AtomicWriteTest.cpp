@@ -74,20 +74,44 @@ TEST(AtomicWrite, KilledWriterLeavesOneWholeVersion)
     const int kills = 80;
     for (int round = 0; round < kills; ++round)
     {
+        // The writer says when it has started and after every whole write,
+        // so that a slow start (a loaded machine, a sanitizer build) does not
+        // eat the delay, and every fourth round surely kills after a change.
+        int report[2];
+        ASSERT_EQ(pipe(report), 0);
         const pid_t writer = fork();
         ASSERT_NE(writer, -1);
         if (writer == 0)
         {
+            close(report[0]);
+            const char started = 'S', written = 'W';
+            if (write(report[1], &started, 1) != 1)
+                _exit(1);
             // Each writer starts with the version the file does not hold.
             for (unsigned i = 0;; ++i)
+            {
                 ((i % 2 == 0) == currentIsA ? versionB : versionA).Write(target);
+                if (write(report[1], &written, 1) != 1)
+                    _exit(1);
+            }
+        }
+        close(report[1]);
+        char heard = 0;
+        ASSERT_EQ(read(report[0], &heard, 1), 1);
+        ASSERT_EQ(heard, 'S');
+        if (round % 4 == 3)
+        {
+            ASSERT_EQ(read(report[0], &heard, 1), 1);
+            ASSERT_EQ(heard, 'W');
         }
         const long maxDelay[] = {50, writeMicroseconds / 4, writeMicroseconds,
                                  2 * writeMicroseconds};
-        SleepMicroseconds(std::uniform_int_distribution<long>(1, maxDelay[scale(random)])(random));
+        SleepMicroseconds(std::uniform_int_distribution<long>(
+            1, round % 4 == 3 ? 50 : maxDelay[scale(random)])(random));
         ASSERT_EQ(kill(writer, SIGKILL), 0);
         int status = 0;
         ASSERT_EQ(waitpid(writer, &status, 0), writer);
+        close(report[0]);
         ASSERT_TRUE(WIFSIGNALED(status));
 
         const std::string now = ReadFile(dir / "Folder.cfg");
