@@ -108,25 +108,17 @@ bool ParseBox(const char* line, size_t keywordLength, double box[4])
 
 // Reads up to wanted bytes at offset without moving the stream, so that one
 // system call serves the header, the first line and the first lines of
-// comments. False on a read error; *got is short only at the end of the file.
+// comments. False on a read error; *got is short only at the end of the file
+// (a regular file's reads come back short there and nowhere else).
 bool ReadAt(FILE* file, int64_t offset, char* dest, size_t wanted, size_t* got)
 {
-    const int fd = fileno(file);
-    size_t total = 0;
-    while (total < wanted)
-    {
-        const ssize_t n = pread(fd, dest + total, wanted - total,
-                                static_cast<off_t>(offset) + static_cast<off_t>(total));
-        if (n < 0 && errno == EINTR)
-            continue;
-        if (n < 0)
-            return false;
-        total += static_cast<size_t>(n);
-        // Files end reads short; asking again would only confirm it.
-        if (n == 0 || total < wanted)
-            break;
-    }
-    *got = total;
+    ssize_t n;
+    do
+        n = pread(fileno(file), dest, wanted, static_cast<off_t>(offset));
+    while (n < 0 && errno == EINTR);
+    if (n < 0)
+        return false;
+    *got = static_cast<size_t>(n);
     return true;
 }
 

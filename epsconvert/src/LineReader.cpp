@@ -16,13 +16,6 @@ bool IsLineBreak(char c)
 }
 } // namespace
 
-LineReader::LineReader(FILE* stream, char* buffer, size_t size)
-    : m_stream(stream), m_buffer(buffer), m_size(size)
-{
-    m_buffer[0] = '\n';
-    m_buffer[1] = '\0';
-}
-
 LineReader::LineReader(FILE* stream, char* buffer, size_t size, size_t preloaded, long streamOffset)
     : m_stream(stream), m_buffer(buffer), m_size(size), m_end(preloaded),
       m_atEof(preloaded < size - 2), m_seekTo(streamOffset)

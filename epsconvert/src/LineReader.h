@@ -8,12 +8,10 @@
 class LineReader
 {
 public:
-    // buffer must hold size bytes (at least 8) and outlive the reader.
-    LineReader(FILE* stream, char* buffer, size_t size);
-
-    // As above, with the first fill already done by the caller: buffer holds
-    // `preloaded` bytes, as many as a fill asks for (size - 2) unless the
-    // file ended. Further reads continue at streamOffset.
+    // buffer must hold size bytes (at least 8) and outlive the reader. The
+    // caller has done the first fill: buffer holds `preloaded` bytes, as many
+    // as a fill asks for (size - 2) unless the file ended. Further reads
+    // continue at streamOffset.
     LineReader(FILE* stream, char* buffer, size_t size, size_t preloaded, long streamOffset);
 
     // The next line, NUL-terminated, pointing into the buffer and valid until
