@@ -76,6 +76,10 @@ private:
     // nativePath, when given, is path already in the file system's encoding.
     SniffResult SniffOne(const wxString& path, const char* nativePath, const wxString& filterId,
                          JobInfoCollection& jobs);
+    // A file found in a folder: refusals go to rejected, an .eps that is not
+    // EPS is dropped.
+    SniffResult SniffListed(const wxString& path, const char* nativePath, const wxString& filterId,
+                            wxArrayString& rejected, JobInfoCollection& jobs);
     long SniffFileList(const wxArrayString& files, wxArrayString& rejected,
                        JobInfoCollection& jobs);
     void ReadUIElement(wxXmlNode* node);

@@ -5,6 +5,7 @@
 #include <limits.h>
 #include <sys/stat.h>
 
+#include <algorithm>
 #include <cstring>
 #include <string>
 #include <vector>
@@ -37,24 +38,22 @@ bool IsDirectory(DIR* dir, const dirent* entry, bool follow)
     return fstatat(dirfd(dir), entry->d_name, &status, follow ? 0 : AT_SYMLINK_NOFOLLOW) == 0 &&
            S_ISDIR(status.st_mode);
 }
-// prefix followed by the name. ASCII reads the same in every file-name
-// encoding and is copied a byte a character; other names go through the
-// converter, which costs many times more.
+
+// prefix followed by the name; empty when the name is no text. ASCII reads
+// the same in every file-name encoding and is copied a byte a character;
+// other names go through the converter, which costs many times more.
 wxString JoinName(const wxString& prefix, const std::string& name)
 {
-    wchar_t wide[NAME_MAX + 1];
-    if (name.size() > NAME_MAX)
-        return prefix + wxString(name.c_str(), *wxConvFileName);
-    for (size_t i = 0; i < name.size(); ++i)
+    const bool ascii = name.size() <= NAME_MAX &&
+                       std::all_of(name.begin(), name.end(),
+                                   [](char c) { return static_cast<unsigned char>(c) < 0x80; });
+    if (!ascii)
     {
-        const auto c = static_cast<unsigned char>(name[i]);
-        if (c >= 0x80)
-        {
-            const wxString converted(name.c_str(), *wxConvFileName);
-            return converted.empty() ? wxString() : prefix + converted;
-        }
-        wide[i] = static_cast<wchar_t>(c);
+        const wxString converted(name.c_str(), *wxConvFileName);
+        return converted.empty() ? wxString() : prefix + converted;
     }
+    wchar_t wide[NAME_MAX];
+    std::copy(name.begin(), name.end(), wide);
     wxString path;
     path.reserve(prefix.length() + name.size());
     path.append(prefix);

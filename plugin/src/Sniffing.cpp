@@ -85,25 +85,24 @@ long EPS::SniffFiles(const wxArrayString& files, wxArrayString& second, wxArrayS
     return m_lStatus = HF_NO_ERROR;
 }
 
+EPS::SniffResult EPS::SniffListed(const wxString& path, const char* nativePath,
+                                  const wxString& filterId, wxArrayString& rejected,
+                                  JobInfoCollection& jobs)
+{
+    const SniffResult result = SniffOne(path, nativePath, filterId, jobs);
+    if (result == SniffResult::Refused)
+        rejected.Add(path);
+    return result;
+}
+
 long EPS::SniffFileList(const wxArrayString& files, wxArrayString& rejected,
                         JobInfoCollection& jobs)
 {
     wxString filterId;
     GetShortName(filterId);
     for (const wxString& path : files)
-    {
-        switch (SniffOne(path, nullptr, filterId, jobs))
-        {
-        case SniffResult::EmptyPath:
+        if (SniffListed(path, nullptr, filterId, rejected, jobs) == SniffResult::EmptyPath)
             return m_lStatus = HF_INPUT_FILE_NOT_FOUND;
-        case SniffResult::Refused:
-            rejected.Add(path);
-            break;
-        case SniffResult::NotEPS: // an .eps that is not EPS is dropped, not offered elsewhere
-        case SniffResult::Accepted:
-            break;
-        }
-    }
     return m_lStatus = HF_NO_ERROR;
 }
 
@@ -114,13 +113,8 @@ long EPS::SniffFolder(const wxString& folder, wxArrayString& rejected, JobInfoCo
     wxString filterId;
     GetShortName(filterId);
     // Straight from the listing: no list of every path is built first.
-    folder_listing::ForEachFile(folder,
-                                [&](const wxString& path, const char* nativePath)
-                                {
-                                    if (SniffOne(path, nativePath, filterId, jobs) ==
-                                        SniffResult::Refused)
-                                        rejected.Add(path);
-                                });
+    folder_listing::ForEachFile(folder, [&](const wxString& path, const char* nativePath)
+                                { SniffListed(path, nativePath, filterId, rejected, jobs); });
     return m_lStatus = HF_NO_ERROR;
 }
 
