@@ -1,37 +1,26 @@
 // Loads the built module exactly as a host does: dlopen, then the entry
 // points by name, then the interface only.
-#include <dlfcn.h>
-
 #include <gtest/gtest.h>
 #include <hotfolder/HFPlugin.h>
 #include <wx/xml/xml.h>
 
+#include "ModuleFixture.h"
+
 namespace
 {
-class LoadedModule : public ::testing::Test
+class LoadedModule : public hf_test::ModuleTest
 {
 protected:
     void SetUp() override
     {
-        handle = dlopen(HF_MODULE_PATH, RTLD_NOW | RTLD_LOCAL);
-        ASSERT_NE(handle, nullptr) << dlerror();
-        info = reinterpret_cast<GetPluginInfoFn>(dlsym(handle, "GetPluginInfo"));
-        instance = reinterpret_cast<GetPluginInstanceFn>(dlsym(handle, "GetPluginInstance"));
-        release = reinterpret_cast<ReleasePluginInstanceFn>(dlsym(handle, "ReleasePluginInstance"));
-        init = reinterpret_cast<InitializePluginFn>(dlsym(handle, "InitializePlugin"));
-        uninit = reinterpret_cast<UninitializePluginFn>(dlsym(handle, "UninitializePlugin"));
-        ASSERT_TRUE(info && instance && release && init && uninit);
-    }
-    void TearDown() override
-    {
-        if (handle)
-            dlclose(handle);
+        ModuleTest::SetUp();
+        info = Entry<GetPluginInfoFn>("GetPluginInfo");
+        init = Entry<InitializePluginFn>("InitializePlugin");
+        uninit = Entry<UninitializePluginFn>("UninitializePlugin");
+        ASSERT_TRUE(info && init && uninit);
     }
 
-    void* handle = nullptr;
     GetPluginInfoFn info = nullptr;
-    GetPluginInstanceFn instance = nullptr;
-    ReleasePluginInstanceFn release = nullptr;
     InitializePluginFn init = nullptr;
     UninitializePluginFn uninit = nullptr;
 };
@@ -61,7 +50,7 @@ TEST_F(LoadedModule, CallingOrderOfAHost)
 {
     PluginInfo record;
     info(&record);
-    HFPlugin* plugin = instance(L"EPS");
+    HFPlugin* plugin = make(L"EPS");
     ASSERT_NE(plugin, nullptr);
 
     EXPECT_EQ(plugin->Initialize("<Server><GA2_HOTFOLDERS>yes</GA2_HOTFOLDERS></Server>"), 0);
@@ -108,7 +97,7 @@ TEST_F(LoadedModule, CallingOrderOfAHost)
 
 TEST_F(LoadedModule, ErrorTextsThroughTheInterface)
 {
-    HFPlugin* plugin = instance(L"");
+    HFPlugin* plugin = make(L"");
     ASSERT_NE(plugin, nullptr);
     const std::pair<long, const char*> table[] = {
         {0, "No Error"},
@@ -164,8 +153,8 @@ TEST_F(LoadedModule, ErrorTextsThroughTheInterface)
 
 TEST_F(LoadedModule, EveryInstanceIsItsOwn)
 {
-    HFPlugin* first = instance(L"a");
-    HFPlugin* second = instance(L"b");
+    HFPlugin* first = make(L"a");
+    HFPlugin* second = make(L"b");
     ASSERT_TRUE(first && second);
     EXPECT_NE(first, second);
     first->Initialize("<Server><SubstrateFamilySupported>on</SubstrateFamilySupported></Server>");
@@ -175,7 +164,7 @@ TEST_F(LoadedModule, EveryInstanceIsItsOwn)
     EXPECT_EQ(name, "Orv.EPS.1");
     release(second);
     release(nullptr); // harmless
-    HFPlugin* unnamed = instance(nullptr);
+    HFPlugin* unnamed = make(nullptr);
     EXPECT_NE(unnamed, nullptr) << "a null name is an empty name";
     release(unnamed);
 }

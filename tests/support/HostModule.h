@@ -1,17 +1,15 @@
 #pragma once
 // Shared by the tests that drive the filter as a host does: the built module
-// opened by name, a folder's Folder.cfg, the job overrides read back from it
-// and a progress recorder.
-#include <dlfcn.h>
-
+// opened by name (ModuleFixture.h), a folder's Folder.cfg, the job overrides
+// read back from it and a progress recorder.
 #include <initializer_list>
 #include <utility>
 #include <vector>
 
-#include <gtest/gtest.h>
 #include <hotfolder/HFPlugin.h>
 #include <wx/xml/xml.h>
 
+#include "ModuleFixture.h"
 #include "db/ConfigurationReader.h"
 #include "db/FilterConfiguration.h"
 #include "db/FolderConfiguration.h"
@@ -58,38 +56,4 @@ struct ProgressRecorder : IProgressTracker
     }
 };
 
-// The built module opened as a host opens it; the instance is released and
-// the module closed after the test.
-class ModuleTest : public ::testing::Test
-{
-protected:
-    void SetUp() override
-    {
-        module = dlopen(HF_MODULE_PATH, RTLD_NOW | RTLD_LOCAL);
-        ASSERT_NE(module, nullptr) << dlerror();
-        make = reinterpret_cast<GetPluginInstanceFn>(dlsym(module, "GetPluginInstance"));
-        release = reinterpret_cast<ReleasePluginInstanceFn>(dlsym(module, "ReleasePluginInstance"));
-        ASSERT_TRUE(make && release);
-    }
-    void TearDown() override
-    {
-        if (plugin)
-            release(plugin);
-        if (module)
-            dlclose(module);
-    }
-    // A fresh instance in place of the current one.
-    void NewPlugin()
-    {
-        if (plugin)
-            release(plugin);
-        plugin = make(L"EPS");
-        ASSERT_NE(plugin, nullptr);
-    }
-
-    void* module = nullptr;
-    HFPlugin* plugin = nullptr;
-    GetPluginInstanceFn make = nullptr;
-    ReleasePluginInstanceFn release = nullptr;
-};
 } // namespace hf_test
