@@ -5,13 +5,13 @@
 
 #include <wx/xml/xml.h>
 
-#include "CommandLine.h"
-#include "FileMoves.h"
-#include "FilterSettings.h"
-#include "FolderWatcher.h"
+#include "cli/CommandLine.h"
+#include "folder/FileMoves.h"
+#include "module/FilterSettings.h"
+#include "folder/FolderWatcher.h"
 #include "HostTestSupport.h"
-#include "SettingCatalogue.h"
-#include "StatusCodes.h"
+#include "module/SettingCatalogue.h"
+#include "module/StatusCodes.h"
 
 using namespace host_test;
 

@@ -1,0 +1,128 @@
+#include "folder/HotFolder.h"
+
+#include <sys/stat.h>
+
+#include <wx/filename.h>
+#include <wx/log.h>
+#include <wx/xml/xml.h>
+
+#include "db/ConfigurationReader.h"
+#include "db/HFDatabase.h"
+#include "db/PathResolver.h"
+
+const char HotFolder::kServerDescriptionName[] = "ServerDescription.xml";
+const char HotFolder::kServerPpdName[] = "server.ppd";
+const char HotFolder::kOutputFolderName[] = "Output";
+
+static bool IsDirectory(const wxString& path)
+{
+    struct stat info;
+    return stat(path.fn_str(), &info) == 0 && S_ISDIR(info.st_mode);
+}
+
+bool HotFolder::Open(const wxString& folder, wxString& error)
+{
+    wxFileName absolute = wxFileName::DirName(folder);
+    absolute.MakeAbsolute();
+    m_folder = absolute.GetPath();
+    if (!IsDirectory(m_folder))
+    {
+        error = wxString::Format("no such folder: %s", m_folder);
+        return false;
+    }
+    m_configFile = db::PathResolver::GetContainerFolder_SettingFilePath(m_folder);
+    wxLogNull quiet; // the store logs parse errors; the host reports in one line
+    int read = db::HFDatabase::ReadSetting(m_configFile, m_setting);
+    if (read == 0)
+    {
+        error =
+            wxString::Format("%s is not a hot folder (no %s); make it one with 'hotfolder init'",
+                             m_folder, m_configFile);
+        return false;
+    }
+    if (read < 0)
+    {
+        error = wxString::Format("cannot read the folder configuration %s", m_configFile);
+        return false;
+    }
+    db::ConfigurationReader::ReadFolderConfiguration(m_configFile, m_folders);
+    db::ConfigurationReader::ReadFilterConfiguration(m_configFile, m_filters);
+    db::ConfigurationReader::ReadJobConfiguration(m_configFile, m_jobs);
+    db::ConfigurationReader::ReadImposeConfiguration(m_configFile, m_impose);
+    db::ConfigurationReader::ReadPreflightConfiguration(m_configFile, m_preflight);
+    return true;
+}
+
+wxString HotFolder::GetServerDescriptionFile() const
+{
+    return wxFileName(db::PathResolver::GetContainerFolderPath(m_folder), kServerDescriptionName)
+        .GetFullPath();
+}
+
+wxString HotFolder::GetDefaultOutputFolder() const
+{
+    return wxFileName(wxFileName::DirName(m_folder).GetPath(), kOutputFolderName).GetFullPath();
+}
+
+static wxString Either(const wxString& recorded, const wxString& fallback)
+{
+    return recorded.empty() ? fallback : recorded;
+}
+
+wxString HotFolder::GetWorkFolder() const
+{
+    return Either(m_folders.GetWorkFolder(), db::PathResolver::GetWorkFolderPath(m_folder));
+}
+
+wxString HotFolder::GetFailedFolder() const
+{
+    return Either(m_folders.GetFailFolder(), db::PathResolver::GetFailFolderPath(m_folder));
+}
+
+wxString HotFolder::GetKeptOriginalsFolder() const
+{
+    return Either(m_folders.GetBackupFolder(), db::PathResolver::GetBackUpFolderPath(m_folder));
+}
+
+const wxXmlNode* FindFilterElement(const wxXmlNode& filterSetting, const wxString& identifier)
+{
+    for (const wxXmlNode* child = filterSetting.GetChildren(); child; child = child->GetNext())
+        if (child->GetType() == wxXML_ELEMENT_NODE && child->GetName() == "Filter" &&
+            child->GetAttribute("name").Strip(wxString::trailing) == identifier)
+            return child;
+    return nullptr;
+}
+
+const wxXmlNode* HotFolder::FindFilter(const wxString& identifier) const
+{
+    return FindFilterElement(GetFilterSetting(), identifier);
+}
+
+bool HotFolder::SaveFilter(const wxXmlNode& filter, wxString& error)
+{
+    wxXmlNode filterSetting(GetFilterSetting());
+    if (filterSetting.GetName() != "FilterSetting")
+        filterSetting = wxXmlNode(wxXML_ELEMENT_NODE, "FilterSetting");
+    const wxString identifier = filter.GetAttribute("name");
+    wxXmlNode* replacement = new wxXmlNode(filter);
+    if (wxXmlNode* old = const_cast<wxXmlNode*>(FindFilterElement(filterSetting, identifier)))
+    {
+        filterSetting.InsertChild(replacement, old);
+        filterSetting.RemoveChild(old);
+        delete old;
+    }
+    else
+        filterSetting.AddChild(replacement);
+
+    db::FilterConfiguration filters;
+    filters.SetFilterSettingNode(filterSetting);
+    wxString saved;
+    if (db::HFDatabase::WriteFolderProperties(m_configFile, m_setting, m_jobs, m_folders, filters,
+                                              m_impose, m_preflight, saved) != 0)
+    {
+        error = wxString::Format("cannot write the folder configuration %s", m_configFile);
+        return false;
+    }
+    m_filters = filters;
+    return true;
+}
