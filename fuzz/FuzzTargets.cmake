@@ -22,3 +22,10 @@ set(HF_FUZZ_client_config_SOURCE ClientConfigFuzzer.cpp)
 set(HF_FUZZ_client_config_LIBS hf_utils)
 set(HF_FUZZ_preference_node_SOURCE PreferenceNodeFuzzer.cpp)
 set(HF_FUZZ_preference_node_LIBS hf_plugin)
+
+# `cmake -DHF_PRINT_FUZZ_TARGETS=ON -P FuzzTargets.cmake` prints the list for
+# scripts/fuzz.sh.
+if(HF_PRINT_FUZZ_TARGETS)
+  string(REPLACE ";" " " names "${HF_FUZZ_TARGETS}")
+  message("${names}")
+endif()

@@ -29,20 +29,18 @@ while getopts "t:mh" option; do
 done
 shift $((OPTIND - 1))
 
-all_targets=(is_this_eps eps_wrapper server_description folder_config
-  preferences_file hotfolder_list client_config preference_node)
+# The target list lives in fuzz/FuzzTargets.cmake, beside the build rules.
+read -r -a all_targets < <(cmake -DHF_PRINT_FUZZ_TARGETS=ON -P "$root/fuzz/FuzzTargets.cmake" 2>&1)
 targets=("$@")
 [ "${#targets[@]}" -eq 0 ] && targets=("${all_targets[@]}")
 
-CC=clang CXX=clang++ cmake -S "$root" -B "$build" -DCMAKE_BUILD_TYPE=RelWithDebInfo \
-  -DHF_BUILD_FUZZERS=ON -DHF_BUILD_TESTS=OFF >/dev/null
+cmake --preset fuzz -S "$root" -B "$build" >/dev/null
 build_targets=()
 for t in "${targets[@]}"; do build_targets+=("fuzz_$t"); done
 cmake --build "$build" -j"${FUZZ_JOBS:-2}" --target "${build_targets[@]}"
 
 export ASAN_OPTIONS=${ASAN_OPTIONS:-detect_leaks=1}
 export UBSAN_OPTIONS=${UBSAN_OPTIONS:-print_stacktrace=1:halt_on_error=1}
-export LSAN_OPTIONS=${LSAN_OPTIONS:-suppressions=$root/fuzz/lsan.supp:print_suppressions=0}
 
 failed=()
 for t in "${targets[@]}"; do

@@ -5,7 +5,7 @@
 set -euo pipefail
 root="$(cd "$(dirname "$0")/.." && pwd)"
 build="${1:-$root/build}"
-cmake -S "$root" -B "$build" >/dev/null
+cmake --preset default -S "$root" -B "$build" >/dev/null
 cmake --build "$build" --target ui_panel_screenshots hf_catalogues -j2
 for language in en de; do
   xvfb-run -a -s "-screen 0 1280x1024x24" "$build/bin/ui_panel_screenshots" "$root/docs" "$language"
