@@ -3,7 +3,6 @@
 // a fresh folder each time) and prints jobs per second and the share of the
 // time spent outside the filter's Process (target: under a third).
 #include <fcntl.h>
-#include <ftw.h>
 #include <spawn.h>
 #include <sys/stat.h>
 #include <sys/wait.h>
@@ -17,6 +16,8 @@
 #include <sstream>
 #include <string>
 #include <vector>
+
+#include "posix/Directories.h"
 
 extern char** environ;
 
@@ -45,11 +46,6 @@ int RunHost(const std::vector<std::string>& args, const std::string& outFile)
     int status = 0;
     waitpid(pid, &status, 0);
     return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-}
-
-int RemoveEntry(const char* path, const struct stat*, int type, struct FTW*)
-{
-    return type == FTW_DP ? rmdir(path) : unlink(path);
 }
 
 std::string SmallEps(int index)
@@ -118,7 +114,7 @@ int main(int argc, char** argv)
         setenv("HOTFOLDER_WAREHOUSE_ROOT", (scratch + "/machine").c_str(), 1);
         Figures figures;
         bool ok = OneRun(scratch, files, figures);
-        nftw(scratch.c_str(), RemoveEntry, 16, FTW_DEPTH | FTW_PHYS);
+        posix::RemoveTree(scratch);
         if (!ok)
         {
             std::fprintf(stderr, "bench_host: run %d failed (see hotfolder's output)\n", run + 1);

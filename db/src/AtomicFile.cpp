@@ -13,6 +13,11 @@
 
 #include <wx/mstream.h>
 
+#include "posix/ErrorText.h"
+#include "posix/PathNames.h"
+#include "posix/UniqueDir.h"
+#include "posix/UniqueFd.h"
+
 namespace
 {
 bool WriteAll(int fd, const char* data, size_t size)
@@ -46,28 +51,12 @@ std::string ResolveTarget(const std::string& path)
     return path;
 }
 
-std::string DirectoryOf(const std::string& path)
-{
-    const size_t slash = path.rfind('/');
-    if (slash == std::string::npos)
-        return ".";
-    if (slash == 0)
-        return "/";
-    return path.substr(0, slash);
-}
-
-std::string BaseName(const std::string& path)
-{
-    const size_t slash = path.rfind('/');
-    return slash == std::string::npos ? path : path.substr(slash + 1);
-}
-
 // O_EXCL with a fresh random suffix: the temp file is ours alone, and its
 // mode is 0666 less the umask like any newly created file.
-int CreateTempBeside(const std::string& target, std::string& tempPath)
+posix::UniqueFd CreateTempBeside(const std::string& target, std::string& tempPath)
 {
-    const std::string directory = DirectoryOf(target);
-    const std::string base = BaseName(target);
+    const std::string directory = posix::DirectoryName(target);
+    const std::string base = posix::BaseName(target);
     static thread_local unsigned seed =
         static_cast<unsigned>(::getpid()) ^ static_cast<unsigned>(::time(nullptr));
     for (int attempt = 0; attempt < 100; ++attempt)
@@ -79,11 +68,11 @@ int CreateTempBeside(const std::string& target, std::string& tempPath)
                                (static_cast<unsigned>(::getpid()) * 2654435761u);
         snprintf(suffix, sizeof suffix, ".%08x", mixed);
         tempPath = directory + "/." + base + suffix + ".tmp";
-        const int fd = ::open(tempPath.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
-        if (fd >= 0 || errno != EEXIST)
+        posix::UniqueFd fd(::open(tempPath.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666));
+        if (fd || errno != EEXIST)
             return fd;
     }
-    return -1;
+    return posix::UniqueFd();
 }
 
 // XML 1.0 has no way to carry most C0 controls, U+FFFE, U+FFFF or surrogate
@@ -122,11 +111,11 @@ void RemoveStaleTempFiles(const std::string& directory, const std::string& base)
 {
     const std::string prefix = "." + base + ".";
     const size_t expectedLength = prefix.size() + 8 + 4; // 8 hex digits, ".tmp"
-    DIR* dir = ::opendir(directory.c_str());
+    posix::UniqueDir dir(directory.c_str());
     if (!dir)
         return;
     const time_t cutoff = ::time(nullptr) - 15 * 60;
-    while (const dirent* entry = ::readdir(dir))
+    while (const dirent* entry = dir.Next())
     {
         const std::string name = entry->d_name;
         if (name.size() != expectedLength || name.compare(0, prefix.size(), prefix) != 0 ||
@@ -137,58 +126,71 @@ void RemoveStaleTempFiles(const std::string& directory, const std::string& base)
         if (::lstat(path.c_str(), &info) == 0 && S_ISREG(info.st_mode) && info.st_mtime < cutoff)
             ::unlink(path.c_str());
     }
-    ::closedir(dir);
 }
 
 void SyncDirectory(const std::string& directory)
 {
-    const int fd = ::open(directory.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
-    if (fd < 0)
-        return;
-    ::fsync(fd);
-    ::close(fd);
+    const posix::UniqueFd fd(::open(directory.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    if (fd)
+        ::fsync(fd.Get());
+}
+
+bool Failed(wxString* reason, int error)
+{
+    if (reason)
+        *reason = wxString::FromUTF8(posix::ErrorText(error).c_str());
+    return false;
 }
 } // namespace
 
 namespace db
 {
-bool AtomicFile::Write(const wxString& path, const void* data, size_t size)
+bool AtomicFile::Write(const wxString& path, const void* data, size_t size, wxString* reason)
 {
     if (path.empty())
-        return false;
+        return Failed(reason, ENOENT);
     const std::string target = ResolveTarget(std::string(path.fn_str()));
     std::string tempPath;
-    const int fd = CreateTempBeside(target, tempPath);
-    if (fd < 0)
-        return false;
+    posix::UniqueFd fd = CreateTempBeside(target, tempPath);
+    if (!fd)
+        return Failed(reason, errno);
 
     // The replacement keeps the permissions (and, for root, the owner) of
     // the file it replaces: the file is shared by every user of the folder.
     struct stat old;
     if (::stat(target.c_str(), &old) == 0 && S_ISREG(old.st_mode))
     {
-        ::fchmod(fd, old.st_mode & 07777);
+        ::fchmod(fd.Get(), old.st_mode & 07777);
         if (::geteuid() == 0)
-            (void)!::fchown(fd, old.st_uid, old.st_gid);
+            (void)!::fchown(fd.Get(), old.st_uid, old.st_gid);
     }
 
-    bool ok = WriteAll(fd, static_cast<const char*>(data), size) && ::fsync(fd) == 0;
-    ok = ::close(fd) == 0 && ok;
-    if (ok)
-        ok = ::rename(tempPath.c_str(), target.c_str()) == 0;
+    bool ok = WriteAll(fd.Get(), static_cast<const char*>(data), size) && ::fsync(fd.Get()) == 0;
+    int error = ok ? 0 : errno;
+    if (!fd.Close() && ok)
+    {
+        ok = false;
+        error = errno;
+    }
+    if (ok && ::rename(tempPath.c_str(), target.c_str()) != 0)
+    {
+        ok = false;
+        error = errno;
+    }
     if (!ok)
     {
         ::unlink(tempPath.c_str());
-        return false;
+        return Failed(reason, error);
     }
-    SyncDirectory(DirectoryOf(target));
-    RemoveStaleTempFiles(DirectoryOf(target), BaseName(target));
+    const std::string directory = posix::DirectoryName(target);
+    SyncDirectory(directory);
+    RemoveStaleTempFiles(directory, posix::BaseName(target));
     return true;
 }
 
-bool AtomicFile::Write(const wxString& path, const std::string& bytes)
+bool AtomicFile::Write(const wxString& path, const std::string& bytes, wxString* reason)
 {
-    return Write(path, bytes.data(), bytes.size());
+    return Write(path, bytes.data(), bytes.size(), reason);
 }
 
 bool AtomicFile::WriteXml(const wxString& path, const wxXmlDocument& document, int indent)

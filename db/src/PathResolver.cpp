@@ -12,6 +12,7 @@
 #include "db/ConfigurationReader.h"
 #include "db/HFDatabase.h"
 #include "db/TempFolderCreator.h"
+#include "posix/UniqueFd.h"
 
 namespace db
 {
@@ -162,11 +163,10 @@ wxString PathResolver::GetRunServiceFileName()
 bool PathResolver::CreateRunServiceFile()
 {
     const std::string path(GetRunServiceFileName().fn_str());
-    const int fd = ::open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
-    if (fd < 0)
+    const posix::UniqueFd fd(::open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666));
+    if (!fd)
         return false;
-    ::fchmod(fd, 0666);
-    ::close(fd);
+    ::fchmod(fd.Get(), 0666); // every user's service must be able to remove it
     return true;
 }
 

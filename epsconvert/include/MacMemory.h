@@ -1,6 +1,7 @@
 #pragma once
 // Stand-ins for the classic pointer allocator: a block or null, with the
-// error code of the last call kept for MemError.
+// error code of the last call kept for MemError. Tests make allocations fail
+// with posix::SetAllocationFailuresForTesting.
 #include <cstddef>
 #include <cstdint>
 
@@ -11,6 +12,3 @@ constexpr int16_t memFullErr = -108;
 void* NewPtr(size_t size);
 void DisposePtr(void* block);
 int16_t MemError();
-
-// Tests use this to make the next allocations fail.
-void SetNewPtrFailureForTesting(bool fail);

@@ -4,13 +4,10 @@
 #include <utility>
 
 #include "EngineMessages.h"
+#include "posix/AllocationFailures.h"
 
 namespace
 {
-// Only tests arm this, from the thread that then calls the engine.
-thread_local int allocationsToSkip = 0;
-thread_local int allocationsToFail = 0;
-
 // One released work buffer of up to 64 KB kept per thread: detection runs
 // once for every arriving file, and a fresh 64 KB from malloc each time
 // costs more than the scan of a typical header.
@@ -26,28 +23,14 @@ thread_local KeptBuffer kept;
 
 void* EngineAlloc(size_t size)
 {
-    if (allocationsToFail > 0)
-    {
-        if (allocationsToSkip > 0)
-            --allocationsToSkip;
-        else
-        {
-            --allocationsToFail;
-            return nullptr;
-        }
-    }
+    if (posix::AllocationShouldFail())
+        return nullptr;
     return std::malloc(size);
 }
 
 void EngineFree(void* block)
 {
     std::free(block);
-}
-
-void SetEngineAllocFailuresForTesting(int skipCount, int failCount)
-{
-    allocationsToSkip = skipCount;
-    allocationsToFail = failCount;
 }
 
 char* AllocateWorkBuffer(size_t largest, size_t* size)
@@ -69,7 +52,7 @@ char* AllocateWorkBuffer(size_t largest, size_t* size)
             continue;
         // A kept buffer serves a request of its own size, but never while a
         // test is making allocations fail.
-        if (kept.block && kept.size == step.size && allocationsToFail == 0)
+        if (kept.block && kept.size == step.size && !posix::AllocationFailuresArmed())
         {
             *size = kept.size;
             return std::exchange(kept.block, nullptr);

@@ -12,6 +12,9 @@
 #include <cerrno>
 #include <string>
 
+#include "posix/Directories.h"
+#include "posix/UniqueFd.h"
+
 namespace
 {
 std::string ToNativePath(wxString const& path)
@@ -26,18 +29,16 @@ bool ClearImmutableFlag(const char* path, const struct stat& info)
 {
     if (!S_ISREG(info.st_mode) && !S_ISDIR(info.st_mode))
         return true;
-    const int fd = open(path, O_RDONLY | O_NONBLOCK | O_NOFOLLOW | O_CLOEXEC | O_NOCTTY);
-    if (fd < 0)
+    const posix::UniqueFd fd(open(path, O_RDONLY | O_NONBLOCK | O_NOFOLLOW | O_CLOEXEC | O_NOCTTY));
+    if (!fd)
         return true; // nothing we could change; chmod will tell
-    bool ok = true;
     int flags = 0;
-    if (ioctl(fd, FS_IOC_GETFLAGS, &flags) == 0 && (flags & (FS_IMMUTABLE_FL | FS_APPEND_FL)))
+    if (ioctl(fd.Get(), FS_IOC_GETFLAGS, &flags) == 0 && (flags & (FS_IMMUTABLE_FL | FS_APPEND_FL)))
     {
         flags &= ~(FS_IMMUTABLE_FL | FS_APPEND_FL);
-        ok = ioctl(fd, FS_IOC_SETFLAGS, &flags) == 0;
+        return ioctl(fd.Get(), FS_IOC_SETFLAGS, &flags) == 0;
     }
-    close(fd);
-    return ok;
+    return true;
 }
 
 thread_local bool walkOk = true;
@@ -55,15 +56,6 @@ int MakeEntryWritable(const char* path, const struct stat* info, int type, struc
         walkOk = false;
     if (chmod(path, 0777) != 0)
         walkOk = false;
-    return 0;
-}
-
-int RemoveEntry(const char* path, const struct stat*, int type, struct FTW*)
-{
-    if (type == FTW_DP || type == FTW_D || type == FTW_DNR)
-        rmdir(path);
-    else
-        unlink(path);
     return 0;
 }
 
@@ -90,7 +82,5 @@ void DeleteFolderChildren(wxString const& folder)
     if (native.empty() || lstat(native.c_str(), &info) != 0)
         return;
     MakeFolderWritable(folder);
-    // Post-order: entries go before the folders that hold them, the folder
-    // itself last.
-    nftw(native.c_str(), RemoveEntry, kOpenDescriptors, FTW_PHYS | FTW_DEPTH);
+    posix::RemoveTree(native); // the folder itself too, despite the name
 }

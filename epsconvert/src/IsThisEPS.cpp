@@ -10,7 +10,7 @@
 #include <cstdlib>
 #include <cstring>
 
-#include "CLocaleScope.h"
+#include "posix/CLocale.h"
 #include "EPStoPS.h"
 #include "EngineAlloc.h"
 #include "EngineMessages.h"
@@ -96,7 +96,7 @@ bool ParseBox(const char* line, size_t keywordLength, double box[4])
     std::memcpy(copy, line, length);
     copy[length] = '\0';
     // Numbers in EPS files always use "."; parse them in the C locale.
-    CLocaleScope cLocale;
+    posix::CLocaleScope cLocale;
     double values[4];
     const char* next = copy + keywordLength;
     for (double& value : values)

@@ -2,15 +2,16 @@
 
 #include <cstdlib>
 
+#include "posix/AllocationFailures.h"
+
 namespace
 {
 thread_local int16_t lastError = noErr;
-bool failNext = false;
 } // namespace
 
 void* NewPtr(size_t size)
 {
-    void* block = failNext ? nullptr : std::malloc(size);
+    void* block = posix::AllocationShouldFail() ? nullptr : std::malloc(size);
     lastError = block ? noErr : memFullErr;
     return block;
 }
@@ -24,9 +25,4 @@ void DisposePtr(void* block)
 int16_t MemError()
 {
     return lastError;
-}
-
-void SetNewPtrFailureForTesting(bool fail)
-{
-    failNext = fail;
 }

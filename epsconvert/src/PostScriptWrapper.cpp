@@ -5,7 +5,7 @@
 #include <ctime>
 #include <vector>
 
-#include "CLocaleScope.h"
+#include "posix/CLocale.h"
 
 namespace
 {
@@ -77,7 +77,7 @@ double Printable(double value)
 
 template <typename... Args> std::string Format(const char* format, Args... args)
 {
-    CLocaleScope cLocale;
+    posix::CLocaleScope cLocale;
     const int length = std::snprintf(nullptr, 0, format, args...);
     if (length < 0)
         return std::string();
@@ -114,7 +114,7 @@ std::string CurrentCreationDate()
     if (localtime_r(&now, &local))
     {
         // AM and PM in English whatever the locale, like the rest of the header.
-        CLocaleScope cLocale;
+        posix::CLocaleScope cLocale;
         strftime(text, sizeof text, "%m/%d/%y %I:%M %p", &local);
     }
     return text;

@@ -1,12 +1,13 @@
 // hotfolder info: what the module says about itself.
 #include <memory>
 
+#include <hotfolder/StatusCodes.h>
+
 #include "cli/CommandLine.h"
 #include "cli/CommandSupport.h"
 #include "cli/ConsoleText.h"
 #include "module/FilterSession.h"
 #include "module/ModuleLocator.h"
-#include "module/StatusCodes.h"
 
 static const char kInfoUsage[] =
     "usage: hotfolder info [--module PATH]\n"
@@ -68,11 +69,11 @@ int RunInfoCommand(const Arguments& args)
     PrintLine(
         wxString::Format("  Merge enabled:           %s", filter.IsMergeEnabled() ? "yes" : "no"));
     PrintLine("Status codes:");
-    for (long code : KnownStatusCodes())
+    for (const HFStatusText& entry : kHFStatusTexts)
     {
         wxString text;
-        filter.GetErrorString(code, text);
-        PrintLine(wxString::Format("  %6ld  %s", code, text));
+        filter.GetErrorString(entry.code, text);
+        PrintLine(wxString::Format("  %6ld  %s", entry.code, text));
     }
     return kExitSuccess;
 }

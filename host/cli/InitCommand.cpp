@@ -157,9 +157,10 @@ int RunInitCommand(const Arguments& args)
         wxString stored = wxFileName(db::PathResolver::GetContainerFolderPath(folder),
                                      HotFolder::kServerDescriptionName)
                               .GetFullPath();
-        if (!db::AtomicFile::Write(stored, ToUtf8(server.GetText())))
+        wxString reason;
+        if (!db::AtomicFile::Write(stored, ToUtf8(server.GetText()), &reason))
         {
-            PrintError("cannot store the server description in " + stored);
+            PrintError("cannot store the server description in " + stored + ": " + reason);
             return kExitSetupFailed;
         }
         if (parsed.Has("--ppd"))
@@ -167,9 +168,9 @@ int RunInitCommand(const Arguments& args)
             const wxString ppdCopy = wxFileName(db::PathResolver::GetContainerFolderPath(folder),
                                                 HotFolder::kServerPpdName)
                                          .GetFullPath();
-            if (!db::AtomicFile::Write(ppdCopy, ppdBytes))
+            if (!db::AtomicFile::Write(ppdCopy, ppdBytes, &reason))
             {
-                PrintError("cannot store the printer description in " + ppdCopy);
+                PrintError("cannot store the printer description in " + ppdCopy + ": " + reason);
                 return kExitSetupFailed;
             }
         }

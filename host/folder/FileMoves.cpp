@@ -2,22 +2,21 @@
 
 #include <cerrno>
 #include <cstdio>
-#include <cstring>
 #include <fcntl.h>
-#include <ftw.h>
-#include <sys/stat.h>
 #include <unistd.h>
 
 #include <wx/filename.h>
 
-static std::string Native(const wxString& path)
-{
-    return std::string(path.fn_str());
-}
+#include "posix/Directories.h"
+#include "posix/ErrorText.h"
+#include "posix/NativePath.h"
+#include "posix/UniqueFd.h"
+
+using posix::NativePath;
 
 static wxString Reason(int error)
 {
-    return wxString::FromUTF8(std::strerror(error));
+    return wxString::FromUTF8(posix::ErrorText(error).c_str());
 }
 
 wxString NumberedName(const wxString& name, int attempt)
@@ -61,27 +60,27 @@ static bool CopyBytes(int in, int out)
 
 bool CopyFileTo(const wxString& file, const wxString& target, wxString& error, bool sync)
 {
-    int in = open(Native(file).c_str(), O_RDONLY | O_CLOEXEC);
-    if (in < 0)
+    posix::UniqueFd in(open(NativePath(file).c_str(), O_RDONLY | O_CLOEXEC));
+    if (!in)
     {
         error = wxString::Format("cannot read %s: %s", file, Reason(errno));
         return false;
     }
-    int out = open(Native(target).c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
-    if (out < 0)
+    posix::UniqueFd out(
+        open(NativePath(target).c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666));
+    if (!out)
     {
         error = wxString::Format("cannot create %s: %s", target, Reason(errno));
-        close(in);
         return false;
     }
-    bool copied = CopyBytes(in, out) && (!sync || fsync(out) == 0);
+    bool copied = CopyBytes(in.Get(), out.Get()) && (!sync || fsync(out.Get()) == 0);
     int saved = errno;
-    close(in);
-    if (close(out) != 0)
+    in.Reset();
+    if (!out.Close())
         copied = false;
     if (!copied)
     {
-        unlink(Native(target).c_str());
+        unlink(NativePath(target).c_str());
         error = wxString::Format("cannot copy %s to %s: %s", file, target, Reason(saved));
     }
     return copied;
@@ -99,16 +98,16 @@ static bool MoveByCopy(const wxString& file, const wxString& directory, const wx
                        wxString& finalPath, wxString& error)
 {
     wxString temporary = wxFileName(directory, ".hotfolder-move-" + name).GetFullPath();
-    unlink(Native(temporary).c_str());
+    unlink(NativePath(temporary).c_str());
     if (!CopyFileTo(file, temporary, error, true)) // the source is unlinked next
         return false;
     for (int attempt = 1; attempt < 10000; ++attempt)
     {
         wxString target = wxFileName(directory, NumberedName(name, attempt)).GetFullPath();
-        if (link(Native(temporary).c_str(), Native(target).c_str()) == 0)
+        if (link(NativePath(temporary).c_str(), NativePath(target).c_str()) == 0)
         {
-            unlink(Native(temporary).c_str());
-            if (unlink(Native(file).c_str()) != 0 && errno != ENOENT)
+            unlink(NativePath(temporary).c_str());
+            if (unlink(NativePath(file).c_str()) != 0 && errno != ENOENT)
             {
                 error = wxString::Format("copied %s to %s but cannot remove it: %s", file, target,
                                          Reason(errno));
@@ -122,7 +121,7 @@ static bool MoveByCopy(const wxString& file, const wxString& directory, const wx
             break;
     }
     error = wxString::Format("cannot move %s into %s: %s", file, directory, Reason(errno));
-    unlink(Native(temporary).c_str());
+    unlink(NativePath(temporary).c_str());
     return false;
 }
 
@@ -132,7 +131,7 @@ bool MoveIntoDirectory(const wxString& file, const wxString& directory, const wx
     for (int attempt = 1; attempt < 10000; ++attempt)
     {
         wxString target = wxFileName(directory, NumberedName(name, attempt)).GetFullPath();
-        if (RenameNoReplace(Native(file), Native(target)) == 0)
+        if (RenameNoReplace(NativePath(file), NativePath(target)) == 0)
         {
             finalPath = target;
             return true;
@@ -150,28 +149,12 @@ bool MoveIntoDirectory(const wxString& file, const wxString& directory, const wx
 
 bool MakeDirectories(const wxString& directory, wxString& error)
 {
-    std::string path = Native(directory);
-    while (path.size() > 1 && path.back() == '/')
-        path.pop_back();
-    for (size_t slash = 1; slash <= path.size(); ++slash)
-    {
-        if (slash != path.size() && path[slash] != '/')
-            continue;
-        std::string prefix = path.substr(0, slash);
-        if (mkdir(prefix.c_str(), 0777) != 0 && errno != EEXIST)
-        {
-            error =
-                wxString::Format("cannot create the directory %s: %s", directory, Reason(errno));
-            return false;
-        }
-    }
-    struct stat info;
-    if (stat(path.c_str(), &info) != 0 || !S_ISDIR(info.st_mode))
-    {
+    const int failure = posix::MakeDirectories(NativePath(directory), 0777);
+    if (failure == ENOTDIR)
         error = wxString::Format("%s is not a directory", directory);
-        return false;
-    }
-    return true;
+    else if (failure != 0)
+        error = wxString::Format("cannot create the directory %s: %s", directory, Reason(failure));
+    return failure == 0;
 }
 
 bool EnsureWritableDirectory(const wxString& directory, wxString& error)
@@ -180,24 +163,19 @@ bool EnsureWritableDirectory(const wxString& directory, wxString& error)
         return false;
     wxString probe =
         wxFileName(directory, wxString::Format(".hotfolder-probe-%d", getpid())).GetFullPath();
-    int fd = open(Native(probe).c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, 0600);
-    if (fd < 0)
+    const posix::UniqueFd fd(
+        open(NativePath(probe).c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, 0600));
+    if (!fd)
     {
         error =
             wxString::Format("cannot write into the directory %s: %s", directory, Reason(errno));
         return false;
     }
-    close(fd);
-    unlink(Native(probe).c_str());
+    unlink(NativePath(probe).c_str());
     return true;
-}
-
-static int RemoveEntry(const char* path, const struct stat*, int type, struct FTW*)
-{
-    return type == FTW_DP ? rmdir(path) : unlink(path);
 }
 
 bool RemoveTree(const wxString& directory)
 {
-    return nftw(Native(directory).c_str(), RemoveEntry, 16, FTW_DEPTH | FTW_PHYS) == 0;
+    return posix::RemoveTree(NativePath(directory)) == 0;
 }

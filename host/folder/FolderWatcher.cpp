@@ -12,19 +12,15 @@
 #include <wx/filename.h>
 
 #include "jobs/StopRequest.h"
-
-FolderWatcher::~FolderWatcher()
-{
-    if (m_fd >= 0)
-        close(m_fd);
-}
+#include "posix/NativePath.h"
+#include "posix/UniqueDir.h"
 
 bool FolderWatcher::Watch(const wxString& folder, wxString& error)
 {
-    m_fd = inotify_init1(IN_NONBLOCK | IN_CLOEXEC);
-    if (m_fd < 0 || inotify_add_watch(m_fd, folder.fn_str(),
-                                      IN_CLOSE_WRITE | IN_MOVED_TO | IN_CREATE | IN_MODIFY |
-                                          IN_ATTRIB | IN_DELETE | IN_MOVED_FROM) < 0)
+    m_fd.Reset(inotify_init1(IN_NONBLOCK | IN_CLOEXEC));
+    if (!m_fd || inotify_add_watch(m_fd.Get(), folder.fn_str(),
+                                   IN_CLOSE_WRITE | IN_MOVED_TO | IN_CREATE | IN_MODIFY |
+                                       IN_ATTRIB | IN_DELETE | IN_MOVED_FROM) < 0)
     {
         error = wxString::Format("cannot watch %s: %s", folder,
                                  wxString::FromUTF8(std::strerror(errno)));
@@ -35,13 +31,13 @@ bool FolderWatcher::Watch(const wxString& folder, wxString& error)
 
 void FolderWatcher::Wait(int timeoutMs)
 {
-    struct pollfd fds[2] = {{m_fd, POLLIN, 0}, {StopRequest::WakeDescriptor(), POLLIN, 0}};
+    struct pollfd fds[2] = {{m_fd.Get(), POLLIN, 0}, {StopRequest::WakeDescriptor(), POLLIN, 0}};
     int count = fds[1].fd >= 0 ? 2 : 1;
     if (poll(fds, count, timeoutMs) > 0 && (fds[0].revents & POLLIN))
     {
         // Only the wake-up matters; the loop rescans the folder itself.
         alignas(struct inotify_event) char buffer[4096];
-        while (read(m_fd, buffer, sizeof(buffer)) > 0)
+        while (read(m_fd.Get(), buffer, sizeof(buffer)) > 0)
         {
         }
     }
@@ -82,19 +78,18 @@ std::vector<wxString> SettleTracker::Settled(const std::vector<wxString>& presen
 std::vector<wxString> ListFolderFiles(const wxString& folder)
 {
     std::vector<wxString> files;
-    DIR* directory = opendir(folder.fn_str());
+    posix::UniqueDir directory(posix::NativePath(folder).c_str());
     if (!directory)
         return files;
-    while (struct dirent* entry = readdir(directory))
+    while (const dirent* entry = directory.Next())
     {
         if (entry->d_name[0] == '.')
             continue;
-        wxString path = wxFileName(folder, wxString(entry->d_name, *wxConvFileName)).GetFullPath();
+        wxString path = wxFileName(folder, posix::FromNativePath(entry->d_name)).GetFullPath();
         struct stat info;
         if (stat(path.fn_str(), &info) == 0 && S_ISREG(info.st_mode))
             files.push_back(path);
     }
-    closedir(directory);
     std::sort(files.begin(), files.end());
     return files;
 }

@@ -5,6 +5,8 @@
 
 #include <wx/string.h>
 
+#include "posix/UniqueFd.h"
+
 // Wakes the watch loop when something changes in a folder (inotify). The loop
 // still rescans on every wake-up and on a short tick, so an overflowed or
 // missed event only delays a file, it never loses one.
@@ -12,7 +14,6 @@ class FolderWatcher
 {
 public:
     FolderWatcher() = default;
-    ~FolderWatcher();
     FolderWatcher(const FolderWatcher&) = delete;
     FolderWatcher& operator=(const FolderWatcher&) = delete;
 
@@ -21,7 +22,7 @@ public:
     void Wait(int timeoutMs);
 
 private:
-    int m_fd = -1;
+    posix::UniqueFd m_fd; // the inotify instance
 };
 
 // A file is taken only when its size and modification time have stayed the

@@ -1,19 +1,18 @@
 #include "module/ModuleLocator.h"
 
 #include <cstdlib>
-#include <limits.h>
-#include <unistd.h>
 
 #include <wx/filename.h>
 
+#include "posix/ExecutablePath.h"
+#include "posix/NativePath.h"
+
 static wxString ExecutableDirectory()
 {
-    char buffer[PATH_MAX];
-    ssize_t length = readlink("/proc/self/exe", buffer, sizeof(buffer) - 1);
-    if (length <= 0)
+    const std::string program = posix::ExecutablePath();
+    if (program.empty())
         return wxString();
-    buffer[length] = '\0';
-    return wxFileName(wxString(buffer, *wxConvFileName)).GetPath();
+    return wxFileName(posix::FromNativePath(program.c_str())).GetPath();
 }
 
 static wxString ModuleBelow(const wxString& executableDirectory, const wxString& libDirectory)
@@ -35,7 +34,7 @@ wxString LocateFilterModule(const wxString& explicitPath)
         return explicitPath;
     if (const char* fromEnvironment = std::getenv("HOTFOLDER_MODULE"))
         if (*fromEnvironment)
-            return wxString(fromEnvironment, *wxConvFileName);
+            return posix::FromNativePath(fromEnvironment);
     const wxString directory = ExecutableDirectory();
     const wxString usual = ModuleBelow(directory, "lib");
 #ifdef HF_INSTALLED_LIBDIR

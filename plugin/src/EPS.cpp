@@ -3,6 +3,7 @@
 #include <cstring>
 
 #include "ErrorCodes.h"
+#include "FilterVersion.h"
 
 const wxString ERRORDIFFUSION_KEY = "ErrorDiffusion";
 const wxString IMAGEPRIORITY_KEY = "Quality";
@@ -10,8 +11,6 @@ const wxString RESOLUTION_1200_KEY = "600x600dpi"; // the name and the value dis
 
 namespace
 {
-const char* const kVersion = "1.0.0.1";
-const char* const kIdentifier = "Orv.EPS.1";
 const char* const kDisplayName = "EPS";
 } // namespace
 
@@ -36,7 +35,7 @@ EPS::~EPS()
 
 void EPS::GetVersion(wxString& out)
 {
-    out = kVersion;
+    out = HF_FILTER_VERSION;
 }
 
 void EPS::GetDisplayName(wxString& out)
@@ -46,7 +45,7 @@ void EPS::GetDisplayName(wxString& out)
 
 void EPS::GetShortName(wxString& out)
 {
-    out = kIdentifier;
+    out = HF_FILTER_IDENTIFIER;
 }
 
 void EPS::GetSupportedFileExtensions(wxArrayString& extensions, wxArrayString& second)

@@ -1,5 +1,6 @@
 // The module's entry points: the host finds these by name.
 #include "EPS.h"
+#include "FilterVersion.h"
 #include "HFExport.h"
 
 HF_MODULE_EXPORT void InitializePlugin() {}
@@ -11,8 +12,8 @@ HF_MODULE_EXPORT void GetPluginInfo(PluginInfo* info)
     if (!info)
         return;
     info->m_llKind = 1;
-    info->m_strVersion = "1.0.0.1";
-    info->m_strIdentifier = "Orv.EPS.1";
+    info->m_strVersion = HF_FILTER_VERSION;
+    info->m_strIdentifier = HF_FILTER_IDENTIFIER;
     info->m_strDisplayName = "EPS";
     info->m_arrExtensions.Add(".eps");
     info->m_arrRequiredServerFeatures.Add("GA2_HOTFOLDERS");

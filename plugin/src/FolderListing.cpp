@@ -12,6 +12,8 @@
 
 #include <wx/strconv.h>
 
+#include "posix/UniqueDir.h"
+
 namespace folder_listing
 {
 namespace
@@ -66,14 +68,15 @@ void ForEachFile(const wxString& folder,
                  const std::function<void(const wxString& path, const char* nativePath)>& visit)
 {
     const wxCharBuffer nativeFolder = folder.fn_str();
-    DIR* dir = nativeFolder.data() ? opendir(nativeFolder.data()) : nullptr;
-    if (!dir)
-        return;
     std::vector<std::string> names;
-    while (const dirent* entry = readdir(dir))
-        if (entry->d_name[0] != '.' && !IsDirectory(dir, entry, true))
-            names.emplace_back(entry->d_name);
-    closedir(dir);
+    {
+        posix::UniqueDir dir(nativeFolder.data());
+        if (!dir)
+            return;
+        while (const dirent* entry = dir.Next())
+            if (entry->d_name[0] != '.' && !IsDirectory(dir.Get(), entry, true))
+                names.emplace_back(entry->d_name);
+    }
 
     const bool endsInSlash = folder.EndsWith("/");
     const wxString prefix = endsInSlash ? folder : folder + "/";
@@ -99,14 +102,14 @@ NameCounts CountPpmlNames(const wxString& folder)
     {
         const std::string path = std::move(pending.back());
         pending.pop_back();
-        DIR* dir = opendir(path.c_str());
+        posix::UniqueDir dir(path.c_str());
         if (!dir)
             continue;
-        while (const dirent* entry = readdir(dir))
+        while (const dirent* entry = dir.Next())
         {
             if (IsDotOrDotDot(entry->d_name))
                 continue;
-            if (IsDirectory(dir, entry, false))
+            if (IsDirectory(dir.Get(), entry, false))
             {
                 pending.push_back(path + "/" + entry->d_name);
                 continue;
@@ -115,7 +118,6 @@ NameCounts CountPpmlNames(const wxString& folder)
             counts.lower += EndsWith(entry->d_name, length, ".ppml");
             counts.upper += EndsWith(entry->d_name, length, ".PPML");
         }
-        closedir(dir);
     }
     return counts;
 }

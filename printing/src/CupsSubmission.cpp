@@ -6,6 +6,7 @@
 #include <cups/cups.h>
 
 #include "CupsJobOptions.h"
+#include "posix/PathNames.h"
 
 namespace
 {
@@ -20,12 +21,6 @@ struct FileCloser
 {
     void operator()(FILE* file) const { std::fclose(file); }
 };
-
-std::string BaseName(const std::string& path)
-{
-    const size_t slash = path.find_last_of('/');
-    return slash == std::string::npos ? path : path.substr(slash + 1);
-}
 
 std::string LastCupsError(const char* what)
 {
@@ -91,7 +86,7 @@ bool SubmitToCups(const std::string& queue, const std::string& psFile, const std
     for (const auto& [name, value] : printing::CupsOptionsFromOverrides(overrides))
         options.count = cupsAddOption(name.c_str(), value.c_str(), options.count, &options.options);
 
-    const std::string title = jobName.empty() ? BaseName(psFile) : jobName;
+    const std::string title = jobName.empty() ? posix::BaseName(psFile) : jobName;
     const int job = cupsCreateJob(CUPS_HTTP_DEFAULT, queue.c_str(), title.c_str(), options.count,
                                   options.options);
     if (job <= 0)

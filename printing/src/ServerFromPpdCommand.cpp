@@ -88,9 +88,11 @@ int RunServerFromPpdCommand(const std::vector<std::string>& args)
         const bool written = std::fwrite(bytes.data(), 1, bytes.size(), stdout) == bytes.size();
         return std::fflush(stdout) == 0 && written ? 0 : 1;
     }
-    if (!db::AtomicFile::Write(wxString::FromUTF8(parsed.output), bytes))
+    wxString reason;
+    if (!db::AtomicFile::Write(wxString::FromUTF8(parsed.output), bytes, &reason))
     {
-        std::fprintf(stderr, "hotfolder server-from-ppd: cannot write %s\n", parsed.output.c_str());
+        std::fprintf(stderr, "hotfolder server-from-ppd: cannot write %s: %s\n",
+                     parsed.output.c_str(), reason.utf8_str().data());
         return 1;
     }
     return 0;

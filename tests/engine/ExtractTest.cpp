@@ -4,7 +4,7 @@
 
 #include <gtest/gtest.h>
 
-#include "EngineAlloc.h"
+#include "posix/AllocationFailures.h"
 #include "EngineTestSupport.h"
 
 using namespace hf_test;
@@ -107,9 +107,9 @@ TEST_F(Extract_, WriteAndReadFailuresAreReported)
               "Error from fwrite in ExtractEPSfromTIFFpreview\n");
 
     // A write-only stream cannot be read from: fread sets the error flag.
-    EXPECT_EQ(Messages(fopen(in.c_str(), "ab"), fopen(scratch.File("out.bin").c_str(), "wb"), 0,
-                       100),
-              "Error from fread in ExtractEPSfromTIFFpreview\n");
+    EXPECT_EQ(
+        Messages(fopen(in.c_str(), "ab"), fopen(scratch.File("out.bin").c_str(), "wb"), 0, 100),
+        "Error from fread in ExtractEPSfromTIFFpreview\n");
 }
 
 TEST_F(Extract_, BufferDegradesAndChunkSizeFollows)
@@ -135,18 +135,18 @@ TEST_F(Extract_, BufferDegradesAndChunkSizeFollows)
     };
     for (const auto& step : steps)
     {
-        SetEngineAllocFailuresForTesting(0, step.failures);
+        posix::SetAllocationFailuresForTesting(0, step.failures);
         const Copy copy = Run(input, 0, 100010);
-        SetEngineAllocFailuresForTesting(0, 0);
+        posix::SetAllocationFailuresForTesting(0, 0);
         EXPECT_EQ(copy.output.size(), step.outputSize) << step.failures;
         EXPECT_TRUE(copy.output == input.substr(0, step.outputSize));
         EXPECT_EQ(copy.messages,
                   std::string(step.messages) + "Premature EOF with leftover BytesToRead = 10\n");
     }
 
-    SetEngineAllocFailuresForTesting(0, 4);
+    posix::SetAllocationFailuresForTesting(0, 4);
     const Copy none = Run(input, 0, 100000);
-    SetEngineAllocFailuresForTesting(0, 0);
+    posix::SetAllocationFailuresForTesting(0, 0);
     EXPECT_EQ(none.output.size(), 0u);
     EXPECT_EQ(none.messages, "1MB not available from malloc; trying smaller amount\n"
                              "64KB not available from malloc; trying smaller amount\n"

@@ -9,7 +9,7 @@
 
 #include <gtest/gtest.h>
 
-#include "EngineAlloc.h"
+#include "posix/AllocationFailures.h"
 #include "EngineTestSupport.h"
 
 using namespace hf_test;
@@ -380,18 +380,18 @@ TEST_F(Detect_, LineBufferDegradesStepByStep)
     };
     for (const auto& step : steps)
     {
-        SetEngineAllocFailuresForTesting(1, step.failures); // the context itself succeeds
+        posix::SetAllocationFailuresForTesting(1, step.failures); // the context itself succeeds
         const Detection d = Detect(path);
-        SetEngineAllocFailuresForTesting(0, 0);
+        posix::SetAllocationFailuresForTesting(0, 0);
         EXPECT_EQ(d.result, step.result) << step.failures;
         EXPECT_EQ(d.messages, step.messages);
         if (step.result == 1)
             ExpectBox(d.info, 11, 12, 13, 14);
     }
 
-    SetEngineAllocFailuresForTesting(0, 1);
+    posix::SetAllocationFailuresForTesting(0, 1);
     const Detection noContext = Detect(path);
-    SetEngineAllocFailuresForTesting(0, 0);
+    posix::SetAllocationFailuresForTesting(0, 0);
     EXPECT_EQ(noContext.result, 0u);
     EXPECT_EQ(noContext.messages, "Error from malloc in IsThisEPS\n");
 }
@@ -407,9 +407,9 @@ TEST_F(Detect_, SmallestBufferReadsLinesAcrossRefills)
         text += "%" + std::string(length, 'z') + "\r\n";
     text += "%%HiResBoundingBox: 1.5 2.5 3.5 4.5\n";
     const std::string path = Write("refill.eps", text);
-    SetEngineAllocFailuresForTesting(1, 2);
+    posix::SetAllocationFailuresForTesting(1, 2);
     const Detection d = Detect(path);
-    SetEngineAllocFailuresForTesting(0, 0);
+    posix::SetAllocationFailuresForTesting(0, 0);
     ASSERT_EQ(d.result, 1u);
     ExpectBox(d.info, 1.5, 2.5, 3.5, 4.5);
 }

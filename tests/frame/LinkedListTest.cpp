@@ -4,6 +4,7 @@
 
 #include "LinkedList.h"
 #include "MacMemory.h"
+#include "posix/AllocationFailures.h"
 
 namespace
 {
@@ -67,9 +68,9 @@ TEST_F(Lists, NullArgumentsAreParameterErrors)
 TEST_F(Lists, AllocatorFailureReportsItsCode)
 {
     Fill(a, {1});
-    SetNewPtrFailureForTesting(true);
+    posix::SetAllocationFailuresForTesting(0, 1);
     EXPECT_EQ(AddToTail(&a, &values[2]), memFullErr);
-    SetNewPtrFailureForTesting(false);
+    posix::SetAllocationFailuresForTesting(0, 0);
     EXPECT_EQ(GetNumberOfItems(&a), 1u);
     EXPECT_EQ(Walk(a), (std::vector<int>{1}));
 }

@@ -5,13 +5,14 @@
 
 #include <wx/xml/xml.h>
 
+#include <hotfolder/StatusCodes.h>
+
 #include "cli/CommandLine.h"
 #include "folder/FileMoves.h"
 #include "module/FilterSettings.h"
 #include "folder/FolderWatcher.h"
 #include "HostTestSupport.h"
 #include "module/SettingCatalogue.h"
-#include "module/StatusCodes.h"
 
 using namespace host_test;
 
@@ -182,7 +183,9 @@ TEST_F(HostFilesTest, AFileSettlesOnlyWhenItStopsChanging)
 
 TEST(HostStatusCodes, TheTableHasTheFamilysCodesOnly)
 {
-    const std::vector<long>& codes = KnownStatusCodes();
+    std::vector<long> codes;
+    for (const HFStatusText& entry : kHFStatusTexts)
+        codes.push_back(entry.code);
     EXPECT_EQ(codes.size(), 29u);
     EXPECT_EQ(std::count(codes.begin(), codes.end(), -1010), 1);
     EXPECT_EQ(std::count(codes.begin(), codes.end(), 1016), 0);

@@ -15,6 +15,7 @@
 
 #include <wx/log.h>
 
+#include "CaseTable.h"
 #include "FolderFixtures.h"
 #include "StoreTestSupport.h"
 #include "db/AtomicFile.h"
@@ -164,6 +165,26 @@ TEST(AtomicWrite, FailedWriteLeavesNoTemporaryFileBehind)
     ASSERT_EQ(storetest::Run({"ls", "-A", dir.path()}, &listing), 0);
     EXPECT_EQ(listing, "Folder.cfg\n");
     EXPECT_FALSE(db::AtomicFile::Write(dir.wx("missing-dir/Folder.cfg"), std::string("x")));
+}
+
+TEST(AtomicWrite, FailureSaysWhy)
+{
+    const std::vector<testkit::CaseFields> cases =
+        testkit::ReadCaseTable("store/atomic-write-failures.txt");
+    ASSERT_FALSE(cases.empty());
+    for (const testkit::CaseFields& c : cases)
+    {
+        ASSERT_EQ(c.size(), 3u);
+        SCOPED_TRACE(c[0] + " | " + c[1]);
+        TempDir dir;
+        if (c[0].rfind("mkdir ", 0) == 0)
+            ASSERT_EQ(mkdir((dir / c[0].substr(6)).c_str(), 0755), 0);
+        else if (c[0].rfind("touch ", 0) == 0)
+            WriteFile(dir / c[0].substr(6), "");
+        wxString reason;
+        EXPECT_FALSE(db::AtomicFile::Write(dir.wx(c[1]), std::string("x"), &reason));
+        EXPECT_EQ(reason, wxString::FromUTF8(c[2]));
+    }
 }
 
 TEST(AtomicWrite, TempFilesOfKilledWritersAreRemovedOnceStale)

@@ -6,16 +6,10 @@
 #include <cstdlib>
 #include <locale.h>
 
+#include "posix/CLocale.h"
+
 namespace
 {
-// One "C" locale object for the whole process; never freed, it is needed
-// until exit.
-locale_t CLocale()
-{
-    static const locale_t loc = newlocale(LC_ALL_MASK, "C", static_cast<locale_t>(0));
-    return loc;
-}
-
 bool OnlySpaceFrom(const char* p)
 {
     while (*p && std::isspace(static_cast<unsigned char>(*p)))
@@ -31,7 +25,7 @@ double StrToDoubleC(const wxString& text, bool* complete)
     const wxScopedCharBuffer utf8 = text.utf8_str();
     const char* begin = utf8.data();
     char* end = nullptr;
-    const double value = strtod_l(begin, &end, CLocale());
+    const double value = strtod_l(begin, &end, posix::CLocale());
     if (complete)
         *complete = end != begin && OnlySpaceFrom(end);
     return value;
@@ -42,7 +36,7 @@ long StrToLongC(const wxString& text, bool* complete)
     const wxScopedCharBuffer utf8 = text.utf8_str();
     const char* begin = utf8.data();
     char* end = nullptr;
-    const long value = strtol_l(begin, &end, 10, CLocale());
+    const long value = strtol_l(begin, &end, 10, posix::CLocale());
     if (complete)
         *complete = end != begin && OnlySpaceFrom(end);
     return value;

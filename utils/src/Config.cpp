@@ -8,6 +8,7 @@
 #include <wx/xml/xml.h>
 
 #include "XmlHelper.h"
+#include "posix/ExecutablePath.h"
 #include "utils/CLocaleNumbers.h"
 
 namespace
@@ -31,13 +32,8 @@ int AttributeCount(const wxXmlNode* node)
 
 wxString ExecutablePath()
 {
-    // The link names the running program even when it was started through
-    // a relative path or another symbolic link.
-    char buffer[4096];
-    const ssize_t length = readlink("/proc/self/exe", buffer, sizeof buffer - 1);
-    if (length <= 0)
-        return wxString();
-    return wxString::FromUTF8(buffer, static_cast<size_t>(length));
+    const std::string program = posix::ExecutablePath();
+    return wxString::FromUTF8(program.data(), program.size());
 }
 } // namespace
 

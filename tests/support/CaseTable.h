@@ -1,0 +1,36 @@
+#pragma once
+// Test cases kept in a text file under tests/data, one case a line, its
+// fields separated by " | ". Blank lines and lines starting with "#" (the
+// table's heading and remarks) are skipped.
+#include <fstream>
+#include <string>
+#include <vector>
+
+namespace testkit
+{
+using CaseFields = std::vector<std::string>;
+
+// The cases of HF_TEST_DATA_DIR/relativePath; empty when the file is missing,
+// which the caller should treat as a failure.
+inline std::vector<CaseFields> ReadCaseTable(const std::string& relativePath)
+{
+    std::vector<CaseFields> cases;
+    std::ifstream in(std::string(HF_TEST_DATA_DIR) + "/" + relativePath);
+    for (std::string line; std::getline(in, line);)
+    {
+        if (line.empty() || line[0] == '#')
+            continue;
+        CaseFields fields;
+        for (size_t start = 0;;)
+        {
+            const size_t bar = line.find(" | ", start);
+            fields.push_back(line.substr(start, bar - start));
+            if (bar == std::string::npos)
+                break;
+            start = bar + 3;
+        }
+        cases.push_back(fields);
+    }
+    return cases;
+}
+} // namespace testkit
