@@ -59,7 +59,7 @@ bool SubmitDeliveredOutput(const std::string& queue, const wxString& output, con
     for (const auto& entry : overrides.GetProperties())
         options.emplace_back(ToUtf8(entry.first), ToUtf8(entry.second.GetValue()));
     std::string reason;
-    if (SubmitToCups(queue, ToUtf8(output), ToUtf8(jobName), options, reason, &jobId))
+    if (printing::SubmitToCups(queue, ToUtf8(output), ToUtf8(jobName), options, reason, &jobId))
         return true;
     error = FromUtf8(reason);
     return false;

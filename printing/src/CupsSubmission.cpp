@@ -7,6 +7,8 @@
 
 #include "CupsJobOptions.h"
 
+namespace printing
+{
 namespace
 {
 struct OptionsHolder
@@ -88,7 +90,7 @@ bool SubmitToCups(const std::string& queue, const std::string& psFile, const std
     }
 
     OptionsHolder options;
-    for (const auto& [name, value] : printing::CupsOptionsFromOverrides(overrides))
+    for (const auto& [name, value] : CupsOptionsFromOverrides(overrides))
         options.count = cupsAddOption(name.c_str(), value.c_str(), options.count, &options.options);
 
     const std::string title = jobName.empty() ? BaseName(psFile) : jobName;
@@ -109,3 +111,4 @@ bool SubmitToCups(const std::string& queue, const std::string& psFile, const std
         *jobId = job;
     return true;
 }
+} // namespace printing

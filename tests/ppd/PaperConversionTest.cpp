@@ -15,6 +15,8 @@
 #include "ServerFromPpd.h"
 #include "db/PluginInitialize.h"
 
+using printing::ServerDescriptionFromPpd;
+
 using hf_test::AddSetting;
 
 namespace
@@ -140,7 +142,6 @@ protected:
         }
         return tried;
     }
-
 };
 } // namespace
 

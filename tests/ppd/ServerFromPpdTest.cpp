@@ -13,8 +13,10 @@
 #include "PpdTextReader.h"
 #include "SampleEps.h"
 #include "ServerFromPpd.h"
-#include "ServerFromPpdCommand.h"
+#include "cli/Commands.h"
 #include "db/PluginInitialize.h"
+
+using printing::ServerDescriptionFromPpd;
 
 namespace
 {
@@ -300,7 +302,8 @@ TEST(ServerFromPpdCommand, UsageAndFailures)
     sample::ScratchDir dir;
     const std::string target = dir.File("server.xml").ToStdString();
     sample::WriteFile(target, "old");
-    EXPECT_EQ(RunServerFromPpdCommand({dir.File("missing.ppd").ToStdString(), "-o", target}), 1);
+    EXPECT_EQ(RunServerFromPpdCommand({dir.File("missing.ppd").ToStdString(), "-o", target}),
+              kExitSetupFailed);
     EXPECT_EQ(hf_test::ReadWholeFile(target), "old");
     // So does an unwritable target.
     EXPECT_EQ(RunServerFromPpdCommand(
