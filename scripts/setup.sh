@@ -11,7 +11,7 @@ packages=(
   locales python3
   clang libclang-rt-14-dev
   libcups2-dev cups-daemon cups-client cups-core-drivers cups-ppdc
-  printer-driver-postscript-hp dpkg-dev
+  printer-driver-postscript-hp cups-filters dpkg-dev
 )
 
 missing=()

@@ -13,3 +13,5 @@ int RunConvertCommand(const Arguments& args);
 int RunInitCommand(const Arguments& args);
 int RunSettingsCommand(int argc, char** argv, const Arguments& args);
 int RunRunCommand(const Arguments& args);
+int RunServerFromPpdCommand(const Arguments& args);
+int RunPrintersCommand(const Arguments& args);

@@ -19,13 +19,12 @@
 #include "db/AtomicFile.h"
 #include "db/HFDatabase.h"
 #include "db/PathResolver.h"
-#ifdef HF_WITH_PRINTING
+#include "CupsQueues.h"
 #include "ServerFromPpd.h"
-#endif
 
 static const char kInitUsage[] =
-    "usage: hotfolder init FOLDER [--server FILE | --ppd FILE.ppd] [--name NAME]\n"
-    "                             [--module PATH]\n"
+    "usage: hotfolder init FOLDER [--server FILE | --ppd FILE.ppd | --printer QUEUE]\n"
+    "                             [--name NAME] [--module PATH]\n"
     "\n"
     "Makes FOLDER (created when missing) a hot folder: its container\n"
     "\"[_Orv_HotFolder_]\" with Folder.cfg (name, work, failed and kept-originals\n"
@@ -35,9 +34,38 @@ static const char kInitUsage[] =
     "\n"
     "--ppd FILE.ppd makes the server description from a printer's PPD file\n"
     "(its papers, default paper and custom size limits) and keeps a copy of\n"
-    "the PPD as server.ppd beside it.\n";
+    "the PPD as server.ppd beside it.\n"
+    "\n"
+    "--printer QUEUE does the same with the description of the CUPS queue\n"
+    "QUEUE (of the scheduler CUPS_SERVER or client.conf names) and binds the\n"
+    "folder to it: 'hotfolder run' prints there unless --submit says otherwise.\n";
 
-static bool IsListed(const wxString& folder)
+namespace
+{
+// What the command line asks for.
+struct InitRequest
+{
+    wxFileName folderName; // absolute
+    wxString folder;
+    std::string serverFile;
+    std::string ppdFile;
+    std::string queue;
+    std::string name;
+    std::string module;
+};
+
+// Everything read and checked before anything is made.
+struct InitPlan
+{
+    ServerDescription server;
+    std::string ppdBytes; // the printer description to keep beside it, if any
+    wxString origin;      // where the server description came from
+    wxString configFile;
+    PluginInfo info;
+    std::unique_ptr<wxXmlNode> filter;
+};
+
+bool IsListed(const wxString& folder)
 {
     wxArrayString folders;
     db::HFDatabase::ReadFoldersList(folders);
@@ -48,13 +76,12 @@ static bool IsListed(const wxString& folder)
 }
 
 // The description of the printer a PPD file describes, and the file's bytes.
-static bool LoadPpdServer(const std::string& ppd, ServerDescription& server, std::string& bytes,
-                          wxString& error)
+bool LoadPpdServer(const std::string& ppd, ServerDescription& server, std::string& bytes,
+                   wxString& error)
 {
-#ifdef HF_WITH_PRINTING
     wxString xml;
     std::string reason;
-    if (!ServerDescriptionFromPpd(ppd, xml, reason))
+    if (!printing::ServerDescriptionFromPpd(ppd, xml, reason))
     {
         error = FromUtf8(reason);
         return false;
@@ -68,64 +95,146 @@ static bool LoadPpdServer(const std::string& ppd, ServerDescription& server, std
     }
     bytes = content.str();
     return server.LoadText(xml, FromUtf8(ppd), error);
-#else
-    (void)ppd;
-    (void)server;
-    (void)bytes;
-    error = "--ppd is not available in this build (it needs CUPS)";
-    return false;
-#endif
 }
 
-int RunInitCommand(const Arguments& args)
+// The description of a CUPS queue, and its PPD's bytes when it has one.
+bool LoadQueueServer(const std::string& queue, ServerDescription& server, std::string& bytes,
+                     wxString& origin, wxString& error)
+{
+    const wxString scheduler = FromUtf8(printing::SchedulerName());
+    const wxString named = "\"" + FromUtf8(queue) + "\"";
+    wxString xml;
+    std::string reason;
+    switch (printing::QueueServerDescription(queue, xml, bytes, reason))
+    {
+    case printing::QueueLookup::Found:
+        origin = "queue " + named + " of the CUPS scheduler at " + scheduler;
+        return server.LoadText(xml, origin, error);
+    case printing::QueueLookup::UnknownQueue:
+        error = "the CUPS scheduler at " + scheduler + " has no queue " + named;
+        return false;
+    case printing::QueueLookup::Unreachable:
+        error = "cannot reach the CUPS scheduler at " + scheduler + " for the queue " + named +
+                ": " + FromUtf8(reason);
+        return false;
+    case printing::QueueLookup::Unusable:
+        break;
+    }
+    error = "the queue " + named + " of the CUPS scheduler at " + scheduler +
+            " cannot be described: " + FromUtf8(reason);
+    return false;
+}
+
+bool ParseInitRequest(const Arguments& args, InitRequest& request, int& status)
 {
     ParsedArgs parsed;
-    int status = 0;
     if (!ParseCommandLine(args,
                           {{"--server", true, false, ""},
                            {"--ppd", true, false, ""},
+                           {"--printer", true, false, ""},
                            {"--name", true, false, ""}},
                           kInitUsage, 1, 1, parsed, status))
-        return status;
-    if (parsed.Has("--server") && parsed.Has("--ppd"))
+        return false;
+    const int sources = parsed.Has("--server") + parsed.Has("--ppd") + parsed.Has("--printer");
+    if (sources > 1)
     {
-        PrintError("--server and --ppd cannot be given together");
+        PrintError(parsed.Has("--printer")
+                       ? "only one of --server, --ppd and --printer can be given"
+                       : "--server and --ppd cannot be given together");
         std::fputs(kInitUsage, stderr);
-        return kExitUsage;
+        status = kExitUsage;
+        return false;
     }
+    request.folderName = wxFileName::DirName(FromUtf8(parsed.positionals[0]));
+    request.folderName.MakeAbsolute();
+    request.folder = request.folderName.GetPath();
+    request.serverFile = parsed.Get("--server");
+    request.ppdFile = parsed.Get("--ppd");
+    request.queue = parsed.Get("--printer");
+    request.name = parsed.Get("--name");
+    request.module = parsed.Get("--module");
+    return true;
+}
 
-    wxFileName folderName = wxFileName::DirName(FromUtf8(parsed.positionals[0]));
-    folderName.MakeAbsolute();
-    const wxString folder = folderName.GetPath();
+// Reads the server description, checks the folder is not one already and
+// loads the module's defaults. False after printing the reason.
+bool PrepareInit(const InitRequest& request, InitPlan& plan)
+{
     wxString error;
+    bool loaded = true;
+    if (!request.serverFile.empty())
+    {
+        plan.origin = FromUtf8(request.serverFile);
+        loaded = plan.server.Load(plan.origin, error);
+    }
+    else if (!request.ppdFile.empty())
+    {
+        plan.origin = FromUtf8(request.ppdFile);
+        loaded = LoadPpdServer(request.ppdFile, plan.server, plan.ppdBytes, error);
+    }
+    else if (!request.queue.empty())
+        loaded = LoadQueueServer(request.queue, plan.server, plan.ppdBytes, plan.origin, error);
+    if (!loaded)
+    {
+        PrintError(error);
+        return false;
+    }
+    plan.configFile = db::PathResolver::GetContainerFolder_SettingFilePath(request.folder);
+    if (wxFileName::FileExists(plan.configFile))
+    {
+        PrintError(request.folder + " is a hot folder already (" + plan.configFile + ")");
+        return false;
+    }
+    const wxString modulePath = LocateFilterModule(FromUtf8(request.module));
+    plan.filter.reset(MakeDefaultFilterNode(modulePath, error, &plan.info));
+    if (!plan.filter)
+    {
+        PrintError(error);
+        return false;
+    }
+    return true;
+}
 
-    ServerDescription server;
-    if (parsed.Has("--server") && !server.Load(FromUtf8(parsed.Get("--server")), error))
-    {
-        PrintError(error);
-        return kExitSetupFailed;
-    }
-    std::string ppdBytes;
-    if (parsed.Has("--ppd") && !LoadPpdServer(parsed.Get("--ppd"), server, ppdBytes, error))
-    {
-        PrintError(error);
-        return kExitSetupFailed;
-    }
-    const wxString configFile = db::PathResolver::GetContainerFolder_SettingFilePath(folder);
-    if (wxFileName::FileExists(configFile))
-    {
-        PrintError(folder + " is a hot folder already (" + configFile + ")");
-        return kExitSetupFailed;
-    }
-    const wxString modulePath = LocateFilterModule(FromUtf8(parsed.Get("--module")));
-    PluginInfo info;
-    std::unique_ptr<wxXmlNode> filter(MakeDefaultFilterNode(modulePath, error, &info));
-    if (!filter)
-    {
-        PrintError(error);
-        return kExitSetupFailed;
-    }
+// Stores a file in the folder's container. False after printing the reason.
+bool StoreBeside(const wxString& folder, const char* name, const std::string& bytes,
+                 const wxString& what)
+{
+    const wxString stored =
+        wxFileName(db::PathResolver::GetContainerFolderPath(folder), name).GetFullPath();
+    wxString reason;
+    if (db::AtomicFile::Write(stored, bytes, &reason))
+        return true;
+    PrintError("cannot store the " + what + " in " + stored + ": " + reason);
+    return false;
+}
 
+// The server description, the printer description and the queue the folder
+// prints on, beside Folder.cfg.
+bool StoreServer(const InitRequest& request, const InitPlan& plan)
+{
+    if (plan.server.IsEmpty())
+        return true;
+    if (!StoreBeside(request.folder, HotFolder::kServerDescriptionName,
+                     ToUtf8(plan.server.GetText()), "server description"))
+        return false;
+    if (!plan.ppdBytes.empty() && !StoreBeside(request.folder, HotFolder::kServerPpdName,
+                                               plan.ppdBytes, "printer description"))
+        return false;
+    if (!request.queue.empty() && !StoreBeside(request.folder, HotFolder::kPrinterQueueName,
+                                               request.queue + "\n", "printer queue"))
+        return false;
+    wxArrayString missing = plan.server.MissingFeatures(plan.info.m_arrRequiredServerFeatures);
+    if (!missing.empty())
+        PrintError("warning: the server does not offer " + wxJoin(missing, ' ') +
+                   ", which the filter needs");
+    return true;
+}
+
+// Makes the folders and writes the configuration. Returns the exit status.
+int ExecuteInit(const InitRequest& request, InitPlan& plan)
+{
+    const wxString& folder = request.folder;
+    wxString error;
     db::FolderConfiguration folders;
     folders.SetHotFolder(folder);
     folders.SetWorkFolder(db::PathResolver::GetWorkFolderPath(folder));
@@ -139,53 +248,30 @@ int RunInitCommand(const Arguments& args)
             return kExitSetupFailed;
         }
 
+    const wxArrayString& dirs = request.folderName.GetDirs();
     db::Setting setting;
-    setting.SetName(parsed.Has("--name")           ? FromUtf8(parsed.Get("--name"))
-                    : folderName.GetDirs().empty() ? folder
-                                                   : folderName.GetDirs().Last());
-    setting.SetDescription(info.m_strDisplayName + " hot folder");
+    setting.SetName(!request.name.empty() ? FromUtf8(request.name)
+                    : dirs.empty()        ? folder
+                                          : dirs.Last());
+    setting.SetDescription(plan.info.m_strDisplayName + " hot folder");
     setting.SetStatusEnable(true);
-    setting.SetInputFormats({db::Setting::PairString(info.m_strIdentifier, info.m_strDisplayName)});
+    setting.SetInputFormats(
+        {db::Setting::PairString(plan.info.m_strIdentifier, plan.info.m_strDisplayName)});
 
     wxXmlNode filterSetting(wxXML_ELEMENT_NODE, "FilterSetting");
-    filterSetting.AddChild(filter.release());
+    filterSetting.AddChild(plan.filter.release());
     db::FilterConfiguration filters;
     filters.SetFilterSettingNode(filterSetting);
 
-    if (!server.IsEmpty())
-    {
-        wxString stored = wxFileName(db::PathResolver::GetContainerFolderPath(folder),
-                                     HotFolder::kServerDescriptionName)
-                              .GetFullPath();
-        wxString reason;
-        if (!db::AtomicFile::Write(stored, ToUtf8(server.GetText()), &reason))
-        {
-            PrintError("cannot store the server description in " + stored + ": " + reason);
-            return kExitSetupFailed;
-        }
-        if (parsed.Has("--ppd"))
-        {
-            const wxString ppdCopy = wxFileName(db::PathResolver::GetContainerFolderPath(folder),
-                                                HotFolder::kServerPpdName)
-                                         .GetFullPath();
-            if (!db::AtomicFile::Write(ppdCopy, ppdBytes, &reason))
-            {
-                PrintError("cannot store the printer description in " + ppdCopy + ": " + reason);
-                return kExitSetupFailed;
-            }
-        }
-        wxArrayString missing = server.MissingFeatures(info.m_arrRequiredServerFeatures);
-        if (!missing.empty())
-            PrintError("warning: the server does not offer " + wxJoin(missing, ' ') +
-                       ", which the filter needs");
-    }
+    if (!StoreServer(request, plan))
+        return kExitSetupFailed;
 
     wxString saved;
-    if (db::HFDatabase::WriteFolderProperties(configFile, setting, db::JobConfiguration(), folders,
-                                              filters, db::ImposeConfiguration(),
+    if (db::HFDatabase::WriteFolderProperties(plan.configFile, setting, db::JobConfiguration(),
+                                              folders, filters, db::ImposeConfiguration(),
                                               db::PreflightConfiguration(), saved) != 0)
     {
-        PrintError("cannot write the folder configuration " + configFile);
+        PrintError("cannot write the folder configuration " + plan.configFile);
         return kExitSetupFailed;
     }
     // The list's writer makes only the last level of the warehouse.
@@ -195,9 +281,21 @@ int RunInitCommand(const Arguments& args)
         PrintError("warning: cannot add " + folder + " to the machine-wide hot-folder list in " +
                    db::PathResolver::GetWarehousePath());
     PrintLine("Hot folder:     " + folder);
-    PrintLine("Configuration:  " + configFile);
-    PrintLine("Filter:         " + info.m_strIdentifier);
-    const std::string origin = parsed.Has("--ppd") ? parsed.Get("--ppd") : parsed.Get("--server");
-    PrintLine("Server:         " + (server.IsEmpty() ? wxString("(none)") : FromUtf8(origin)));
+    PrintLine("Configuration:  " + plan.configFile);
+    PrintLine("Filter:         " + plan.info.m_strIdentifier);
+    PrintLine("Server:         " + (plan.server.IsEmpty() ? wxString("(none)") : plan.origin));
     return kExitSuccess;
+}
+} // namespace
+
+int RunInitCommand(const Arguments& args)
+{
+    InitRequest request;
+    int status = kExitSuccess;
+    if (!ParseInitRequest(args, request, status))
+        return status;
+    InitPlan plan;
+    if (!PrepareInit(request, plan))
+        return kExitSetupFailed;
+    return ExecuteInit(request, plan);
 }

@@ -44,6 +44,8 @@ static const char kRunUsage[] =
     "                   (of the scheduler CUPS_SERVER or client.conf names), with\n"
     "                   the job's overrides as options; a refused submission\n"
     "                   counts as a failed job, its output stays delivered\n"
+    "                   (a folder bound by init --printer prints on its queue\n"
+    "                   without --submit)\n"
     "\n"
     "Exit status: 0 when every job succeeded, 1 when a job failed, 2 for a bad\n"
     "command line, 3 when the folder, its configuration or the module is unusable.\n";
@@ -158,12 +160,32 @@ bool StopMarkerPresent()
 {
     return db::PathResolver::GetStopAllHFFilePath().FileExists();
 }
-} // namespace
 
-int RunRunCommand(const Arguments& args)
+// What the command line asks for.
+struct RunRequest
+{
+    std::string folder;
+    std::string outFolder; // "" for the folder's default
+    std::string module;
+    std::string cupsQueue; // --submit; otherwise the queue the folder is bound to
+    long settleMs = 500;
+    long delayJobsMs = 0;
+    bool watch = false;
+    bool stats = false;
+};
+
+// The opened folder, the places its jobs go and the running filter.
+struct RunSetup
+{
+    HotFolder folder;
+    ServerDescription server;
+    JobPlaces places;
+    std::unique_ptr<FilterSession> session;
+};
+
+bool ParseRunRequest(const Arguments& args, RunRequest& request, int& status)
 {
     ParsedArgs parsed;
-    int status = 0;
     if (!ParseCommandLine(args,
                           {{"--watch", false, false, ""},
                            {"--out", true, false, ""},
@@ -172,45 +194,46 @@ int RunRunCommand(const Arguments& args)
                            {"--stats", false, false, ""},
                            {"--submit", true, false, ""}},
                           kRunUsage, 1, 1, parsed, status))
-        return status;
-    const long settleMs = ParseMilliseconds(parsed.Get("--settle"), 500);
-    const long delayJobsMs = ParseMilliseconds(parsed.Get("--delay-jobs"), 0);
-    if (settleMs < 0 || delayJobsMs < 0)
+        return false;
+    request.settleMs = ParseMilliseconds(parsed.Get("--settle"), 500);
+    request.delayJobsMs = ParseMilliseconds(parsed.Get("--delay-jobs"), 0);
+    if (request.settleMs < 0 || request.delayJobsMs < 0)
     {
         PrintError("--settle and --delay-jobs take a number of milliseconds");
-        return kExitUsage;
+        status = kExitUsage;
+        return false;
     }
-
-    wxString error;
-    std::string cupsQueue;
     if (parsed.Has("--submit"))
     {
-        if (!ParseSubmitTarget(parsed.Get("--submit"), cupsQueue, error))
+        wxString error;
+        if (!ParseSubmitTarget(parsed.Get("--submit"), request.cupsQueue, error))
         {
             PrintError(error);
-            return kExitUsage;
-        }
-        if (!CupsSubmissionAvailable())
-        {
-            PrintError("--submit: CUPS submission is not available in this build");
-            return kExitSetupFailed;
+            status = kExitUsage;
+            return false;
         }
     }
+    request.folder = parsed.positionals[0];
+    request.outFolder = parsed.Get("--out");
+    request.module = parsed.Get("--module");
+    request.watch = parsed.Has("--watch");
+    request.stats = parsed.Has("--stats");
+    return true;
+}
 
-    HotFolder folder;
-    ServerDescription server;
-    if (!OpenFolderAndServer(parsed.positionals[0], folder, server))
-        return kExitSetupFailed;
-
-    JobPlaces places;
+// Where the jobs of the folder go. Returns the exit status.
+int PreparePlaces(const RunRequest& request, RunSetup& setup)
+{
+    const HotFolder& folder = setup.folder;
+    JobPlaces& places = setup.places;
     places.configFile = folder.GetConfigFile();
     places.workFolder = folder.GetWorkFolder();
     places.failedFolder = folder.GetFailedFolder();
     places.keptFolder = folder.GetKeptOriginalsFolder();
-    places.cupsQueue = cupsQueue;
-    if (parsed.Has("--out"))
+    places.cupsQueue = request.cupsQueue.empty() ? folder.GetBoundQueue() : request.cupsQueue;
+    if (!request.outFolder.empty())
     {
-        wxFileName out = wxFileName::DirName(FromUtf8(parsed.Get("--out")));
+        wxFileName out = wxFileName::DirName(FromUtf8(request.outFolder));
         out.MakeAbsolute();
         places.outputFolder = out.GetPath();
     }
@@ -222,6 +245,7 @@ int RunRunCommand(const Arguments& args)
         PrintError("the output directory cannot be the hot folder itself");
         return kExitUsage;
     }
+    wxString error;
     if (!EnsureWritableDirectory(places.outputFolder, error))
     {
         PrintError("unusable output directory: " + error);
@@ -233,59 +257,98 @@ int RunRunCommand(const Arguments& args)
             PrintError(error);
             return kExitSetupFailed;
         }
+    return kExitSuccess;
+}
 
-    const wxString modulePath = LocateFilterModule(FromUtf8(parsed.Get("--module")));
-    std::unique_ptr<FilterSession> session =
-        FilterSession::Start(modulePath, server.GetText(), &folder.GetFilterSetting(), error);
-    if (!session)
+// Opens the folder, makes its places and starts the filter. Returns the exit status.
+int PrepareRun(const RunRequest& request, RunSetup& setup)
+{
+    if (!OpenFolderAndServer(request.folder, setup.folder, setup.server))
+        return kExitSetupFailed;
+    const int status = PreparePlaces(request, setup);
+    if (status != kExitSuccess)
+        return status;
+    wxString error;
+    const wxString modulePath = LocateFilterModule(FromUtf8(request.module));
+    setup.session = FilterSession::Start(modulePath, setup.server.GetText(),
+                                         &setup.folder.GetFilterSetting(), error);
+    if (!setup.session)
     {
         PrintError(error);
         return kExitSetupFailed;
     }
-    wxArrayString missing = server.MissingFeatures(session->Info().m_arrRequiredServerFeatures);
+    wxArrayString missing =
+        setup.server.MissingFeatures(setup.session->Info().m_arrRequiredServerFeatures);
     if (!missing.empty())
         PrintError("warning: the server description does not offer " + wxJoin(missing, ' ') +
                    ", which the filter needs");
+    return kExitSuccess;
+}
 
+// Takes files as they arrive until a stop is asked for. Returns the exit
+// status when the watch cannot start, otherwise kExitSuccess.
+int WatchFolder(const RunRequest& request, const HotFolder& folder, FolderRun& run,
+                ProgressDisplay& progress)
+{
+    FolderWatcher watcher;
+    wxString error;
+    if (!watcher.Watch(folder.GetFolder(), error))
+    {
+        PrintError(error);
+        return kExitSetupFailed;
+    }
+    progress.Note("watching " + folder.GetFolder() + " (Ctrl-C to stop)");
+    SettleTracker settle{std::chrono::milliseconds(request.settleMs)};
+    while (!StopRequest::Requested() && !StopMarkerPresent())
+    {
+        std::vector<wxString> candidates;
+        for (const wxString& path : settle.Settled(ListFolderFiles(folder.GetFolder())))
+            if (!run.IsSetAside(path))
+                candidates.push_back(path);
+        if (!run.Pass(candidates))
+            break;
+        // Short ticks while files settle; inotify wakes us early.
+        watcher.Wait(std::max(50L, std::min(250L, request.settleMs / 2)));
+    }
+    progress.Note(StopRequest::Requested() ? "stop requested; stopped"
+                                           : "the StopHF marker appeared; stopped");
+    return kExitSuccess;
+}
+
+int ExecuteRun(const RunRequest& request, RunSetup& setup)
+{
     StopRequest::Install();
     ProgressDisplay progress(StdoutIsTerminal());
     RunStatistics statistics;
-    FolderRun run(*session, folder, places, progress, statistics, delayJobsMs);
-
-    if (!parsed.Has("--watch"))
+    FolderRun run(*setup.session, setup.folder, setup.places, progress, statistics,
+                  request.delayJobsMs);
+    if (request.watch)
     {
-        if (StopMarkerPresent())
-            progress.Note("the StopHF marker is present; nothing is processed");
-        else
-            run.Pass(ListFolderFiles(folder.GetFolder()));
+        const int status = WatchFolder(request, setup.folder, run, progress);
+        if (status != kExitSuccess)
+            return status;
     }
+    else if (StopMarkerPresent())
+        progress.Note("the StopHF marker is present; nothing is processed");
     else
-    {
-        FolderWatcher watcher;
-        if (!watcher.Watch(folder.GetFolder(), error))
-        {
-            PrintError(error);
-            return kExitSetupFailed;
-        }
-        progress.Note("watching " + folder.GetFolder() + " (Ctrl-C to stop)");
-        SettleTracker settle{std::chrono::milliseconds(settleMs)};
-        while (!StopRequest::Requested() && !StopMarkerPresent())
-        {
-            std::vector<wxString> candidates;
-            for (const wxString& path : settle.Settled(ListFolderFiles(folder.GetFolder())))
-                if (!run.IsSetAside(path))
-                    candidates.push_back(path);
-            if (!run.Pass(candidates))
-                break;
-            // Short ticks while files settle; inotify wakes us early.
-            watcher.Wait(std::max(50L, std::min(250L, settleMs / 2)));
-        }
-        progress.Note(StopRequest::Requested() ? "stop requested; stopped"
-                                               : "the StopHF marker appeared; stopped");
-    }
+        run.Pass(ListFolderFiles(setup.folder.GetFolder()));
 
     statistics.PrintSummary();
-    if (parsed.Has("--stats"))
+    if (request.stats)
         statistics.PrintTiming();
     return statistics.failed == 0 ? kExitSuccess : kExitJobsFailed;
+}
+} // namespace
+
+int RunRunCommand(const Arguments& args)
+{
+    RunRequest request;
+    int status = kExitSuccess;
+    if (!ParseRunRequest(args, request, status))
+        return status;
+    RunSetup setup;
+    status = PrepareRun(request, setup);
+    if (status != kExitSuccess)
+        return status;
+    return ExecuteRun(request, setup);
 }

@@ -2,6 +2,8 @@
 
 #include <sys/stat.h>
 
+#include <fstream>
+
 #include <wx/filename.h>
 #include <wx/log.h>
 #include <wx/xml/xml.h>
@@ -12,6 +14,7 @@
 
 const char HotFolder::kServerDescriptionName[] = "ServerDescription.xml";
 const char HotFolder::kServerPpdName[] = "server.ppd";
+const char HotFolder::kPrinterQueueName[] = "PrinterQueue.txt";
 const char HotFolder::kOutputFolderName[] = "Output";
 
 static bool IsDirectory(const wxString& path)
@@ -57,6 +60,17 @@ wxString HotFolder::GetServerDescriptionFile() const
 {
     return wxFileName(db::PathResolver::GetContainerFolderPath(m_folder), kServerDescriptionName)
         .GetFullPath();
+}
+
+std::string HotFolder::BoundQueueOf(const wxString& folder)
+{
+    const wxString record =
+        wxFileName(db::PathResolver::GetContainerFolderPath(folder), kPrinterQueueName)
+            .GetFullPath();
+    std::ifstream in(record.fn_str());
+    std::string queue;
+    std::getline(in, queue);
+    return queue;
 }
 
 wxString HotFolder::GetDefaultOutputFolder() const

@@ -1,5 +1,6 @@
 #pragma once
 #include <memory>
+#include <string>
 
 #include <wx/string.h>
 
@@ -22,6 +23,8 @@ public:
     static const char kServerDescriptionName[];
     // Beside it: the printer description it was made from (init --ppd).
     static const char kServerPpdName[];
+    // Beside it: the CUPS queue the folder prints on (init --printer), one line.
+    static const char kPrinterQueueName[];
     // Beside the container, unless the run names another place.
     static const char kOutputFolderName[];
 
@@ -33,6 +36,9 @@ public:
     const wxString& GetConfigFile() const { return m_configFile; }
     wxString GetServerDescriptionFile() const;
     wxString GetDefaultOutputFolder() const;
+    // The CUPS queue the folder is bound to, or "".
+    std::string GetBoundQueue() const { return BoundQueueOf(m_folder); }
+    static std::string BoundQueueOf(const wxString& folder);
     // Recorded paths, or the container defaults when Folder.cfg has none.
     wxString GetWorkFolder() const;
     wxString GetFailedFolder() const;

@@ -7,20 +7,9 @@
 #include "db/ConfigurationReader.h"
 #include "db/JobConfiguration.h"
 
-#ifdef HF_WITH_PRINTING
 #include "CupsSubmission.h"
-#endif
 
 static const char kCupsPrefix[] = "cups:";
-
-bool CupsSubmissionAvailable()
-{
-#ifdef HF_WITH_PRINTING
-    return true;
-#else
-    return false;
-#endif
-}
 
 bool ParseSubmitTarget(const std::string& text, std::string& queue, wxString& error)
 {
@@ -50,7 +39,6 @@ bool ParseSubmitTarget(const std::string& text, std::string& queue, wxString& er
 bool SubmitDeliveredOutput(const std::string& queue, const wxString& output, const wxString& ticket,
                            const wxString& jobName, int& jobId, wxString& error)
 {
-#ifdef HF_WITH_PRINTING
     // The ticket holds the overrides the filter chose for this job (its
     // paper above all), which the queue must apply too.
     db::JobConfiguration overrides;
@@ -59,17 +47,8 @@ bool SubmitDeliveredOutput(const std::string& queue, const wxString& output, con
     for (const auto& entry : overrides.GetProperties())
         options.emplace_back(ToUtf8(entry.first), ToUtf8(entry.second.GetValue()));
     std::string reason;
-    if (SubmitToCups(queue, ToUtf8(output), ToUtf8(jobName), options, reason, &jobId))
+    if (printing::SubmitToCups(queue, ToUtf8(output), ToUtf8(jobName), options, reason, &jobId))
         return true;
     error = FromUtf8(reason);
     return false;
-#else
-    (void)queue;
-    (void)output;
-    (void)ticket;
-    (void)jobName;
-    jobId = 0;
-    error = "CUPS submission is not available in this build";
-    return false;
-#endif
 }

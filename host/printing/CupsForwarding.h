@@ -5,9 +5,6 @@
 
 // Handing a delivered output on to a print queue ("run --submit cups:QUEUE").
 
-// True when this build can submit to CUPS at all.
-bool CupsSubmissionAvailable();
-
 // Reads "cups:QUEUE". False with a message when the text does not have that
 // form or names no queue.
 bool ParseSubmitTarget(const std::string& text, std::string& queue, wxString& error);

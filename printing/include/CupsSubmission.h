@@ -3,6 +3,8 @@
 #include <utility>
 #include <vector>
 
+namespace printing
+{
 // Sends a PostScript file to a CUPS queue of the scheduler the CUPS client
 // is set up for (cupsSetServer, CUPS_SERVER or client.conf). The job is
 // named jobName (the file's own name when empty) and carries the job
@@ -11,3 +13,4 @@
 bool SubmitToCups(const std::string& queue, const std::string& psFile, const std::string& jobName,
                   const std::vector<std::pair<std::string, std::string>>& overrides,
                   std::string& error, int* jobId = nullptr);
+} // namespace printing

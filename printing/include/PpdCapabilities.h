@@ -10,7 +10,7 @@ struct PpdPaper
     std::string keyword;     // the PageSize choice, e.g. "A4"
     std::string displayName; // its translation text, UTF-8
     std::string pwgName;     // standard media name, "" when none is known
-    std::string command;     // the PostScript that selects the paper
+    std::string command;     // the PostScript that selects the paper (see PageCode.h)
     double width = 0;
     double height = 0;
     // Imageable area

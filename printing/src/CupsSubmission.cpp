@@ -8,6 +8,8 @@
 #include "CupsJobOptions.h"
 #include "posix/PathNames.h"
 
+namespace printing
+{
 namespace
 {
 struct OptionsHolder
@@ -83,7 +85,7 @@ bool SubmitToCups(const std::string& queue, const std::string& psFile, const std
     }
 
     OptionsHolder options;
-    for (const auto& [name, value] : printing::CupsOptionsFromOverrides(overrides))
+    for (const auto& [name, value] : CupsOptionsFromOverrides(overrides))
         options.count = cupsAddOption(name.c_str(), value.c_str(), options.count, &options.options);
 
     const std::string title = jobName.empty() ? posix::BaseName(psFile) : jobName;
@@ -104,3 +106,4 @@ bool SubmitToCups(const std::string& queue, const std::string& psFile, const std
         *jobId = job;
     return true;
 }
+} // namespace printing

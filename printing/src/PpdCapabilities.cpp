@@ -7,6 +7,8 @@
 #include <cups/ppd.h>
 #include <cups/pwg.h>
 
+#include "PageCode.h"
+
 namespace printing
 {
 namespace
@@ -53,7 +55,7 @@ int DefaultResolution(ppd_file_t* ppd)
     return static_cast<int>(std::strtol(attr->value, nullptr, 10));
 }
 
-void ReadCustomSize(ppd_file_t* ppd, PpdCustomSize& custom)
+void ReadCustomSize(ppd_file_t* ppd, bool inJclSection, PpdCustomSize& custom)
 {
     ppd_attr_t* code = ppdFindAttr(ppd, "CustomPageSize", "True");
     if (!ppd->variable_sizes || !code)
@@ -69,6 +71,8 @@ void ReadCustomSize(ppd_file_t* ppd, PpdCustomSize& custom)
     custom.right = ppd->custom_margins[2];
     custom.top = ppd->custom_margins[3];
     custom.command = code->value ? code->value : "";
+    if (!IsPostScriptPageCode(custom.command, inJclSection))
+        custom.command = kStandardCustomSizeCode;
     // The filter puts the size's operands straight in front of this code,
     // so it must start with a blank. A space, not the PPD's line break: an
     // XML reader drops a text's leading line break as white-space-only data.
@@ -95,6 +99,7 @@ bool ReadPpdCapabilities(const std::string& ppdPath, PpdCapabilities& capabiliti
         return false;
     }
 
+    const bool inJclSection = pageSize->section == PPD_ORDER_JCL;
     PpdCapabilities result;
     result.modelName = ppd->nickname ? ppd->nickname : (ppd->modelname ? ppd->modelname : "");
     result.defaultPaper = pageSize->defchoice;
@@ -113,6 +118,8 @@ bool ReadPpdCapabilities(const std::string& ppdPath, PpdCapabilities& capabiliti
         paper.keyword = choice.choice;
         paper.displayName = choice.text[0] ? choice.text : choice.choice;
         paper.command = choice.code ? choice.code : "";
+        if (!IsPostScriptPageCode(paper.command, inJclSection))
+            paper.command = StandardPageSizeCode(size->width, size->length);
         paper.width = size->width;
         paper.height = size->length;
         paper.left = size->left;
@@ -127,7 +134,7 @@ bool ReadPpdCapabilities(const std::string& ppdPath, PpdCapabilities& capabiliti
         error = "the printer description " + ppdPath + " has no paper with known dimensions";
         return false;
     }
-    ReadCustomSize(ppd.get(), result.custom);
+    ReadCustomSize(ppd.get(), inJclSection, result.custom);
     capabilities = std::move(result);
     return true;
 }

@@ -1,25 +1,19 @@
 #include "ServerDescriptionWriter.h"
 
-#include <charconv>
 #include <cmath>
 
 #include <wx/mstream.h>
 #include <wx/xml/xml.h>
 
+#include "PageCode.h"
+
 namespace printing
 {
 namespace
 {
-// Shortest text that reads back as the same float; always ".". PPD numbers
-// are single precision, so this gives "595.276" rather than 17 digits.
 wxString Number(double value)
 {
-    char text[64];
-    const float narrowed = static_cast<float>(value);
-    const auto result = (std::nearbyint(value) == value && std::fabs(value) < 1e9)
-                            ? std::to_chars(text, text + sizeof text, static_cast<long>(value))
-                            : std::to_chars(text, text + sizeof text, narrowed);
-    return wxString::FromAscii(text, result.ptr - text);
+    return wxString::FromAscii(PointsNumber(value).c_str());
 }
 
 // The PPD parser hands texts over as UTF-8; a file that lies about its

@@ -3,11 +3,14 @@
 #include "PpdCapabilities.h"
 #include "ServerDescriptionWriter.h"
 
+namespace printing
+{
 bool ServerDescriptionFromPpd(const std::string& ppdPath, wxString& xml, std::string& error)
 {
-    printing::PpdCapabilities capabilities;
-    if (!printing::ReadPpdCapabilities(ppdPath, capabilities, error))
+    PpdCapabilities capabilities;
+    if (!ReadPpdCapabilities(ppdPath, capabilities, error))
         return false;
-    xml = printing::ServerDescriptionXml(capabilities);
+    xml = ServerDescriptionXml(capabilities);
     return true;
 }
+} // namespace printing

@@ -49,7 +49,7 @@ TEST_F(HostTest, ServerFromPpdWritesThePapersOfThePrinter)
     EXPECT_NE(Host({"--help"}).out.find("server-from-ppd"), std::string::npos);
 
     hf_test::ProcessResult missing = Host({"server-from-ppd", scratch + "/absent.ppd"});
-    EXPECT_EQ(missing.exitCode, 1);
+    EXPECT_EQ(missing.exitCode, 3);
     EXPECT_FALSE(missing.err.empty());
     EXPECT_EQ(Host({"server-from-ppd"}).exitCode, 2);
 }

@@ -11,6 +11,8 @@
 #include "PrivateCupsd.h"
 #include "SampleEps.h"
 
+using printing::SubmitToCups;
+
 namespace
 {
 const char* const kQueue = "hotfolder_test";

@@ -15,6 +15,8 @@
 #include "ServerFromPpd.h"
 #include "db/PluginInitialize.h"
 
+using printing::ServerDescriptionFromPpd;
+
 using hf_test::AddSetting;
 
 namespace
@@ -140,13 +142,23 @@ protected:
         }
         return tried;
     }
-
 };
 } // namespace
 
 TEST_F(PaperConversion, EveryPaperOfTheTestPrinter)
 {
     EXPECT_EQ(ConvertOnPapers(ppd_sources::TestPpd(), {}), 4u);
+}
+
+// An A4 job through each description of the table lands on a 595 x 842 page,
+// whether the description kept the printer's code or has the standard one.
+TEST_F(PaperConversion, A4ThroughEachDescriptionOfTheTable)
+{
+    size_t tried = 0;
+    for (const ppd_sources::TableCase& row : ppd_sources::DescriptionTable())
+        if (access(row.path.c_str(), R_OK) == 0)
+            tried += ConvertOnPapers(row.path, {"A4"});
+    EXPECT_GE(tried, 2u);
 }
 
 TEST_F(PaperConversion, GenericPostScriptPrinterPapers)
@@ -173,7 +185,8 @@ TEST_F(PaperConversion, HpPrinterPapers)
 TEST_F(PaperConversion, CustomSizesThroughThePrintersOwnCode)
 {
     sample::ScratchDir dir;
-    std::vector<std::string> ppds = {ppd_sources::TestPpd()};
+    std::vector<std::string> ppds = {ppd_sources::TestPpd(),
+                                     std::string(HF_TEST_DATA_DIR) + "/ppd/test-jcl-custom.ppd"};
     for (const std::string& hp : ppd_sources::HpPpds(dir.Path().ToStdString(), 3))
         ppds.push_back(hp);
     size_t tried = 0;

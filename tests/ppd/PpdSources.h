@@ -21,6 +21,36 @@ inline std::string TestPpd()
     return std::string(HF_TEST_DATA_DIR) + "/ppd/test-postscript.ppd";
 }
 
+struct TableCase
+{
+    std::string path;
+    bool keepsCode = false; // the printer's page code is PostScript
+    std::string what;
+};
+
+// tests/data/ppd/descriptions.txt: "FILE kept|standard what it checks";
+// FILE is relative to that folder unless absolute.
+inline std::vector<TableCase> DescriptionTable()
+{
+    const std::string dir = std::string(HF_TEST_DATA_DIR) + "/ppd/";
+    std::istringstream lines(hf_test::ReadWholeFile(dir + "descriptions.txt"));
+    std::vector<TableCase> cases;
+    for (std::string line; std::getline(lines, line);)
+    {
+        std::istringstream words(line);
+        TableCase row;
+        std::string code;
+        if (line.empty() || line[0] == '#' || !(words >> row.path >> code))
+            continue;
+        if (row.path[0] != '/')
+            row.path = dir + row.path;
+        row.keepsCode = code == "kept";
+        std::getline(words >> std::ws, row.what);
+        cases.push_back(row);
+    }
+    return cases;
+}
+
 // "" when CUPS's PPD compiler or its sample driver is not installed.
 inline std::string GenericPostScriptPpd(const std::string& dir)
 {

@@ -27,6 +27,7 @@ struct Description
 {
     std::vector<Paper> papers; // PageSize choices in file order
     std::string defaultPageSize;
+    bool pageSizeInJcl = false; // "*JCLOpenUI *PageSize"
     bool customAllowed = false;
     std::string customCode;
     double minWidth = 0, maxWidth = 0, minHeight = 0, maxHeight = 0;
@@ -57,6 +58,14 @@ inline std::vector<double> Numbers(const std::string& text)
     for (double value; in >> value;)
         numbers.push_back(value);
     return numbers;
+}
+
+// Whether a page code is PostScript that the job itself may carry: not in the
+// JCL section, not printer job language (hex "<1B>" as the PPD writes it).
+inline bool IsPostScriptCode(const Description& d, const std::string& code)
+{
+    return !d.pageSizeInJcl && code.find("@PJL") == std::string::npos &&
+           code.find("<1B>%-12345X") == std::string::npos;
 }
 
 inline Paper& PaperFor(Description& d, const std::string& keyword)
@@ -123,6 +132,8 @@ inline bool Read(const std::string& path, Description& d)
             paper.code = value;
             d.papers.push_back(paper);
         }
+        else if (main == "JCLOpenUI" && option == "*PageSize")
+            d.pageSizeInJcl = true;
         else if (main == "DefaultPageSize")
             d.defaultPageSize = value;
         else if (main == "PaperDimension")

@@ -13,8 +13,10 @@
 #include "PpdTextReader.h"
 #include "SampleEps.h"
 #include "ServerFromPpd.h"
-#include "ServerFromPpdCommand.h"
+#include "cli/Commands.h"
 #include "db/PluginInitialize.h"
+
+using printing::ServerDescriptionFromPpd;
 
 namespace
 {
@@ -47,6 +49,25 @@ bool SizeOfMediaName(const wxString& name, double& width, double& height)
     width *= perUnit;
     height *= perUnit;
     return true;
+}
+
+// A printer's own page code when it is PostScript; otherwise the standard
+// setpagedevice with the paper's size.
+void ExpectPageCode(const ppd_text::Description& ppd, const wxString& command,
+                    const ppd_text::Paper& paper)
+{
+    if (ppd_text::IsPostScriptCode(ppd, paper.code))
+    {
+        EXPECT_EQ(Trimmed(Utf8(command)), Trimmed(paper.code));
+        return;
+    }
+    double width = 0, height = 0;
+    ASSERT_EQ(std::sscanf(Utf8(command).c_str(), "<< /PageSize [%lf %lf] >> setpagedevice", &width,
+                          &height),
+              2)
+        << command;
+    EXPECT_NEAR(width, paper.width, 1e-3);
+    EXPECT_NEAR(height, paper.height, 1e-3);
 }
 
 // Everything the description says about papers and custom sizes, checked
@@ -86,7 +107,7 @@ void ExpectDescriptionMatches(const std::string& ppdPath)
             EXPECT_NEAR(sheet.Right, paper.urx, 1e-3);
             EXPECT_NEAR(sheet.Bottom, paper.ury, 1e-3);
         }
-        EXPECT_EQ(Trimmed(Utf8(sheet.PSCommand)), Trimmed(paper.code));
+        ExpectPageCode(ppd, sheet.PSCommand, paper);
         // The standard name given as alias is one of this size.
         double aliasWidth = 0, aliasHeight = 0;
         ASSERT_TRUE(SizeOfMediaName(sheet.PaperAlias, aliasWidth, aliasHeight)) << sheet.PaperAlias;
@@ -110,7 +131,7 @@ void ExpectDescriptionMatches(const std::string& ppdPath)
         {
             EXPECT_NEAR(defaultSheet.Width, paper.width, 1e-3);
             EXPECT_NEAR(defaultSheet.Height, paper.height, 1e-3);
-            EXPECT_EQ(Trimmed(Utf8(defaultSheet.PSCommand)), Trimmed(paper.code));
+            ExpectPageCode(ppd, defaultSheet.PSCommand, paper);
         }
 
     stCustomPageSizeAttribute custom;
@@ -126,12 +147,17 @@ void ExpectDescriptionMatches(const std::string& ppdPath)
         EXPECT_EQ(custom.BottomHWMargin, std::ceil(ppd.margins[1]));
         EXPECT_EQ(custom.RightHWMargin, std::ceil(ppd.margins[2]));
         EXPECT_EQ(custom.TopHWMargin, std::ceil(ppd.margins[3]));
-        EXPECT_EQ(Trimmed(Utf8(custom.command)), Trimmed(ppd.customCode));
+        EXPECT_EQ(Trimmed(Utf8(custom.command)),
+                  ppd_text::IsPostScriptCode(ppd, ppd.customCode)
+                      ? Trimmed(ppd.customCode)
+                      : "pop pop pop << /PageSize [ 5 -2 roll ] >> setpagedevice");
         // The filter writes the size's operands right in front of the code.
         EXPECT_TRUE(custom.command.StartsWith(" ")) << custom.command;
         EXPECT_FALSE(custom.SubstrateHeightToLength);
     }
 
+    EXPECT_EQ(xml.Find("@PJL"), wxNOT_FOUND);
+    EXPECT_EQ(xml.Find("\x1b"), wxNOT_FOUND);
     EXPECT_TRUE(PluginInitialize::IsServerGA2Enabled(xml));
     EXPECT_TRUE(PluginInitialize::IsFeatureEnabled(xml, "HF_EPS_FILTER"));
     // Page sizes go out as job overrides, which the filter skips for
@@ -189,6 +215,31 @@ TEST(ServerFromPpd, TestPrinterPapersSizesCommandsAndCustomLimits)
     PluginInitialize::InitializePreferenceUnit(xml, unit);
     EXPECT_EQ(dpi, 1200);
     EXPECT_EQ(unit, "mm") << "the default paper is A4";
+}
+
+// One printer description a line: a checked-in one, or a system one that is
+// skipped when its package is missing.
+TEST(ServerFromPpd, DescriptionsOfTheTable)
+{
+    size_t checked = 0;
+    for (const ppd_sources::TableCase& row : ppd_sources::DescriptionTable())
+    {
+        if (access(row.path.c_str(), R_OK) != 0)
+        {
+            std::printf("skipped (not installed): %s\n", row.path.c_str());
+            continue;
+        }
+        SCOPED_TRACE(row.what);
+        ExpectDescriptionMatches(row.path);
+        ppd_text::Description text;
+        ASSERT_TRUE(ppd_text::Read(row.path, text));
+        bool kept = false;
+        for (const auto& paper : text.papers)
+            kept = kept || ppd_text::IsPostScriptCode(text, paper.code);
+        EXPECT_EQ(kept, row.keepsCode);
+        ++checked;
+    }
+    EXPECT_GE(checked, 2u);
 }
 
 TEST(ServerFromPpd, GenericPostScriptPrinterOfCups)
@@ -300,7 +351,8 @@ TEST(ServerFromPpdCommand, UsageAndFailures)
     sample::ScratchDir dir;
     const std::string target = dir.File("server.xml").ToStdString();
     sample::WriteFile(target, "old");
-    EXPECT_EQ(RunServerFromPpdCommand({dir.File("missing.ppd").ToStdString(), "-o", target}), 1);
+    EXPECT_EQ(RunServerFromPpdCommand({dir.File("missing.ppd").ToStdString(), "-o", target}),
+              kExitSetupFailed);
     EXPECT_EQ(hf_test::ReadWholeFile(target), "old");
     // So does an unwritable target.
     EXPECT_EQ(RunServerFromPpdCommand(

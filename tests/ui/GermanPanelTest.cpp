@@ -2,29 +2,18 @@
 // and shown, and still "." in every number the map receives.
 #include <cstdlib>
 #include <filesystem>
-#include <fstream>
 
 #include <hotfolder/HFTranslations.h>
 
+#include "GermanClient.h"
 #include "PanelTestFixture.h"
 
 using namespace ui_test;
 
-// The client follows the workstation language only as version 3.3; the
-// language file and the configuration go to a private home for this run.
 void UiTestBeforeToolkit()
 {
-    namespace fs = std::filesystem;
-    const fs::path home = fs::temp_directory_path() / ("hf-ui-german-" + std::to_string(getpid()));
-    fs::create_directories(home / "Vomal QDK");
-    fs::create_directories(home / "Resources");
-    std::ofstream(home / "Vomal QDK" / "current.lang") << "de_DE\n";
-    std::ofstream(home / "Resources" / "HFConfig.cfg")
-        << "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<HFConfig><Application>"
-           "<HFConfiguration><Entry key=\"APP_HF_VERSION\" value=\"3.3\"/></HFConfiguration>"
-           "</Application></HFConfig>\n";
-    setenv("HOME", home.c_str(), 1);
-    setenv("HOTFOLDER_RESOURCES_DIR", (home / "Resources").c_str(), 1);
+    static const std::filesystem::path home = UseGermanClientConfiguration("ui-german");
+    std::atexit([] { std::filesystem::remove_all(home); });
 }
 
 class GermanPanel : public PanelTest

@@ -14,6 +14,7 @@
 #include <hotfolder/HFTranslations.h>
 
 #include "ControlIds.h"
+#include "GermanClient.h"
 #include "CustomPageSizeDlg.h"
 #include "ImageSizePanelWithoutMerge.h"
 #include "PanelFactories.h"
@@ -125,5 +126,14 @@ wxIMPLEMENT_APP_NO_MAIN(ScreenshotApp);
 
 int main(int argc, char** argv)
 {
-    return wxEntry(argc, argv);
+    // The German pictures show what a German user sees: the application
+    // language, and with it the panel's decimal separator, come from the
+    // client configuration, not only the catalogue.
+    std::filesystem::path germanHome;
+    if (argc >= 3 && std::string(argv[2]) == "de")
+        germanHome = UseGermanClientConfiguration("screenshots");
+    const int status = wxEntry(argc, argv);
+    if (!germanHome.empty())
+        std::filesystem::remove_all(germanHome);
+    return status;
 }
