@@ -6,6 +6,18 @@ set(HF_FUZZ_TARGETS
   is_this_eps eps_wrapper server_description folder_config
   preferences_file hotfolder_list client_config preference_node)
 
+# The engine's targets run without the toolkit; every other one also takes
+# the toolkit half of the support code.
+set(HF_FUZZ_ENGINE_TARGETS is_this_eps eps_wrapper)
+foreach(name ${HF_FUZZ_TARGETS})
+  if(name IN_LIST HF_FUZZ_ENGINE_TARGETS)
+    set(HF_FUZZ_${name}_SUPPORT ${HF_FUZZ_DIR}/support/FuzzSupport.cpp)
+  else()
+    set(HF_FUZZ_${name}_SUPPORT
+      ${HF_FUZZ_DIR}/support/FuzzSupport.cpp ${HF_FUZZ_DIR}/support/FuzzToolkit.cpp)
+  endif()
+endforeach()
+
 set(HF_FUZZ_is_this_eps_SOURCE IsThisEpsFuzzer.cpp)
 set(HF_FUZZ_is_this_eps_LIBS hf_epsconvert)
 set(HF_FUZZ_eps_wrapper_SOURCE EpsWrapperFuzzer.cpp)
