@@ -28,9 +28,10 @@ bool NormaliseSettingValue(const wxString& key, const wxString& value, wxString&
     case SettingKind::Flag:
     {
         wxString word = value.Lower();
-        if (word == "1" || word == "yes" || word == "true" || word == "on")
+        if (word == FormatSettingFlag(true) || word == "yes" || word == "true" || word == "on")
             stored = FormatSettingFlag(true);
-        else if (word == "0" || word == "no" || word == "false" || word == "off")
+        else if (word == FormatSettingFlag(false) || word == "no" || word == "false" ||
+                 word == "off")
             stored = FormatSettingFlag(false);
         else
         {
