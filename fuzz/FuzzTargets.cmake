@@ -6,6 +6,26 @@ set(HF_FUZZ_TARGETS
   is_this_eps eps_wrapper server_description folder_config
   preferences_file hotfolder_list client_config preference_node)
 
+# `cmake -DHF_PRINT_FUZZ_TARGETS=ON -P FuzzTargets.cmake` prints the list for
+# scripts/fuzz.sh.
+if(HF_PRINT_FUZZ_TARGETS)
+  string(REPLACE ";" " " names "${HF_FUZZ_TARGETS}")
+  message("${names}")
+  return()
+endif()
+
+# The engine's targets run without the toolkit; every other one also takes
+# the toolkit half of the support code.
+set(HF_FUZZ_ENGINE_TARGETS is_this_eps eps_wrapper)
+foreach(name ${HF_FUZZ_TARGETS})
+  if(name IN_LIST HF_FUZZ_ENGINE_TARGETS)
+    set(HF_FUZZ_${name}_SUPPORT ${HF_FUZZ_DIR}/support/FuzzSupport.cpp)
+  else()
+    set(HF_FUZZ_${name}_SUPPORT
+      ${HF_FUZZ_DIR}/support/FuzzSupport.cpp ${HF_FUZZ_DIR}/support/FuzzToolkit.cpp)
+  endif()
+endforeach()
+
 set(HF_FUZZ_is_this_eps_SOURCE IsThisEpsFuzzer.cpp)
 set(HF_FUZZ_is_this_eps_LIBS hf_epsconvert)
 set(HF_FUZZ_eps_wrapper_SOURCE EpsWrapperFuzzer.cpp)
@@ -22,10 +42,3 @@ set(HF_FUZZ_client_config_SOURCE ClientConfigFuzzer.cpp)
 set(HF_FUZZ_client_config_LIBS hf_utils)
 set(HF_FUZZ_preference_node_SOURCE PreferenceNodeFuzzer.cpp)
 set(HF_FUZZ_preference_node_LIBS hf_plugin)
-
-# `cmake -DHF_PRINT_FUZZ_TARGETS=ON -P FuzzTargets.cmake` prints the list for
-# scripts/fuzz.sh.
-if(HF_PRINT_FUZZ_TARGETS)
-  string(REPLACE ";" " " names "${HF_FUZZ_TARGETS}")
-  message("${names}")
-endif()

@@ -1,5 +1,6 @@
 #include "db/FilterConfiguration.h"
 
+#include "SettingsKeys.h"
 #include "XmlHelper.h"
 
 namespace
@@ -53,12 +54,14 @@ wxString FilterConfiguration::GetOutputFormatForFilter(const wxString& filter,
         wxXmlNode* ui = CXmlNodeHelper::Find(node, "UI", true);
         if (!ui)
             continue;
-        if (filter == "Orv.EPS.1" && HasChildWithText(ui, "OUTPUTFILETYPEEPS", "1"))
+        if (filter == "Orv.EPS.1" &&
+            HasChildWithText(ui, SettingsKeys::OUTPUTFILETYPEEPS, FormatSettingFlag(true)))
             return "EPS";
-        if (filter == "Orv.TIFF.1" && HasChildWithText(ui, "OUTPUTFILETYPETIFF", "1"))
+        if (filter == "Orv.TIFF.1" &&
+            HasChildWithText(ui, "OUTPUTFILETYPETIFF", FormatSettingFlag(true)))
             return "TIFF";
-        if (wxXmlNode* ps = CXmlNodeHelper::Find(ui, "OUTPUTFILETYPEPS"))
-            return TextOf(ps) == "1" ? "PS" : "PDF";
+        if (wxXmlNode* ps = CXmlNodeHelper::Find(ui, SettingsKeys::OUTPUTFILETYPEPS))
+            return IsSettingOn(TextOf(ps)) ? "PS" : "PDF";
     }
     return result;
 }

@@ -1,13 +1,13 @@
 #pragma once
 // Clean-up of job folders. Works with system calls only: no path ever reaches
-// a shell.
-#include <wx/string.h>
+// a shell. Paths are 8-bit (UTF-8) text like every path of the engine; the
+// module does not export these, so no host interface fixes their types.
 
 // Clears the immutable flag where set and allowed, and gives every entry of
-// the tree at path mode 0777. False when path does not exist or any entry
-// could not be made writable.
-bool MakeFolderWritable(wxString const& path);
+// the tree at path mode 0777. False when path is null, empty or does not
+// exist, or when any entry could not be made writable.
+bool MakeFolderWritable(const char* path);
 
 // Removes everything below folder and then folder itself, after making each
 // entry writable. Failures are not reported.
-void DeleteFolderChildren(wxString const& folder);
+void DeleteFolderChildren(const char* folder);

@@ -9,18 +9,15 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-#include <cerrno>
-#include <string>
-
 #include "posix/Directories.h"
 #include "posix/UniqueFd.h"
 
 namespace
 {
-std::string ToNativePath(wxString const& path)
+bool IsExistingPath(const char* path)
 {
-    const wxScopedCharBuffer utf8 = path.utf8_str();
-    return std::string(utf8.data(), utf8.length());
+    struct stat info;
+    return path && *path && lstat(path, &info) == 0;
 }
 
 // Clears the immutable and append-only flags where set. Only regular files
@@ -62,25 +59,21 @@ int MakeEntryWritable(const char* path, const struct stat* info, int type, struc
 constexpr int kOpenDescriptors = 32;
 } // namespace
 
-bool MakeFolderWritable(wxString const& path)
+bool MakeFolderWritable(const char* path)
 {
-    const std::string native = ToNativePath(path);
-    struct stat info;
-    if (native.empty() || lstat(native.c_str(), &info) != 0)
+    if (!IsExistingPath(path))
         return false;
     walkOk = true;
     // Pre-order, so a folder is opened up before its entries are visited.
-    if (nftw(native.c_str(), MakeEntryWritable, kOpenDescriptors, FTW_PHYS) != 0)
+    if (nftw(path, MakeEntryWritable, kOpenDescriptors, FTW_PHYS) != 0)
         return false;
     return walkOk;
 }
 
-void DeleteFolderChildren(wxString const& folder)
+void DeleteFolderChildren(const char* folder)
 {
-    const std::string native = ToNativePath(folder);
-    struct stat info;
-    if (native.empty() || lstat(native.c_str(), &info) != 0)
+    if (!IsExistingPath(folder))
         return;
     MakeFolderWritable(folder);
-    posix::RemoveTree(native); // the folder itself too, despite the name
+    posix::RemoveTree(folder); // the folder itself too, despite the name
 }

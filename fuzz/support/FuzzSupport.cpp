@@ -3,10 +3,6 @@
 #include <cstdio>
 #include <cstdlib>
 #include <filesystem>
-#include <memory>
-
-#include <wx/init.h>
-#include <wx/log.h>
 
 namespace fuzzsupport
 {
@@ -51,10 +47,9 @@ void Fail(const char* condition, const char* file, int line)
 
 void InitialiseOnce()
 {
-    static std::unique_ptr<wxInitializer> toolkit;
-    if (toolkit)
-        return;
     Scratch& scratch = TheScratch();
+    if (!scratch.path.empty())
+        return;
     scratch.path = MakeScratchDirectory();
     std::filesystem::create_directories(WarehouseDirectory());
     std::filesystem::create_directories(ResourcesDirectory());
@@ -63,17 +58,6 @@ void InitialiseOnce()
     setenv("HOTFOLDER_WAREHOUSE_ROOT", scratch.path.c_str(), 1);
     setenv("HOTFOLDER_RESOURCES_DIR", ResourcesDirectory().c_str(), 1);
     setenv("HOME", scratch.path.c_str(), 1);
-
-    toolkit = std::make_unique<wxInitializer>();
-    if (!toolkit->IsOk())
-    {
-        std::fputs("the toolkit did not initialise\n", stderr);
-        std::abort();
-    }
-    // Parse errors are expected by the thousand; a log window or stderr
-    // chatter would only slow the run down.
-    delete wxLog::SetActiveTarget(nullptr);
-    wxLog::EnableLogging(false);
 }
 
 const std::string& ScratchDirectory()
@@ -106,15 +90,6 @@ std::string WriteScratchFile(const std::string& path, const uint8_t* data, size_
         std::abort();
     }
     return path;
-}
-
-wxString TextOf(const uint8_t* data, size_t size)
-{
-    const char* bytes = reinterpret_cast<const char*>(data);
-    wxString text = wxString::FromUTF8(bytes, size);
-    if (text.empty() && size > 0)
-        text = wxString::From8BitData(bytes, size);
-    return text;
 }
 } // namespace fuzzsupport
 

@@ -1,12 +1,11 @@
 #pragma once
-// What every fuzz entry point shares: a toolkit initialised once with its
-// log silenced, a private scratch directory the configuration readers are
-// pointed at, and a hard stop when a reader breaks one of its promises.
+// What every fuzz entry point shares: a private scratch directory the
+// configuration readers are pointed at, and a hard stop when the code under
+// test breaks one of its promises. Needs no toolkit, so the engine's targets
+// run without one; FuzzToolkit.h adds it for the others.
 #include <cstddef>
 #include <cstdint>
 #include <string>
-
-#include <wx/string.h>
 
 // Stops the run (libFuzzer keeps the input) when a documented promise of the
 // code under test does not hold.
@@ -21,7 +20,7 @@ namespace fuzzsupport
 {
 [[noreturn]] void Fail(const char* condition, const char* file, int line);
 
-// Sets up the toolkit and the scratch directory; later calls do nothing.
+// Sets up the scratch directory; later calls do nothing.
 void InitialiseOnce();
 
 // The process's scratch directory, without a trailing '/'. Holds
@@ -33,10 +32,6 @@ std::string ResourcesDirectory();
 
 // Replaces the file with exactly these bytes; the path is returned.
 std::string WriteScratchFile(const std::string& path, const uint8_t* data, size_t size);
-
-// The bytes as text the way the client receives them: UTF-8 when they are
-// valid UTF-8, else one character per byte, so no input is lost as empty.
-wxString TextOf(const uint8_t* data, size_t size);
 } // namespace fuzzsupport
 
 extern "C" int LLVMFuzzerInitialize(int* argc, char*** argv);

@@ -1,12 +1,12 @@
 // The client configuration HFConfig.cfg in the application's Resources.
 // The configuration is one object per process and keeps the keys it has
 // seen, as it does in the client when the file is loaded again.
-#include "FuzzSupport.h"
+#include "FuzzToolkit.h"
 #include "utils/Config.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {
-    fuzzsupport::InitialiseOnce();
+    fuzzsupport::InitialiseToolkitOnce();
     static const std::string file = fuzzsupport::ResourcesDirectory() + "/HFConfig.cfg";
     fuzzsupport::WriteScratchFile(file, data, size);
 

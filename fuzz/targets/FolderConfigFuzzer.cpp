@@ -1,12 +1,12 @@
 // A hot folder's Folder.cfg as found on disk, read by the root reader and
 // by every block reader.
-#include "FuzzSupport.h"
+#include "FuzzToolkit.h"
 #include "db/ConfigurationReader.h"
 #include "db/HFDatabase.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {
-    fuzzsupport::InitialiseOnce();
+    fuzzsupport::InitialiseToolkitOnce();
     static const std::string file = fuzzsupport::ScratchDirectory() + "/Folder.cfg";
     const wxString path = wxString::FromUTF8(fuzzsupport::WriteScratchFile(file, data, size));
 

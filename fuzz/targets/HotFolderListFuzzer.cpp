@@ -3,12 +3,12 @@
 // ones that exist come back, each once in any case.
 #include <wx/filename.h>
 
-#include "FuzzSupport.h"
+#include "FuzzToolkit.h"
 #include "db/HFDatabase.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {
-    fuzzsupport::InitialiseOnce();
+    fuzzsupport::InitialiseToolkitOnce();
     static const std::string file = fuzzsupport::WarehouseDirectory() + "/HotFolderList.cfg";
     fuzzsupport::WriteScratchFile(file, data, size);
 

@@ -7,11 +7,11 @@
 #include <wx/xml/xml.h>
 
 #include "EPS.h"
-#include "FuzzSupport.h"
+#include "FuzzToolkit.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {
-    fuzzsupport::InitialiseOnce();
+    fuzzsupport::InitialiseToolkitOnce();
     wxMemoryInputStream stream(data, size);
     wxXmlDocument document;
     if (!document.Load(stream, "UTF-8") || !document.GetRoot())

@@ -1,10 +1,10 @@
 // The machine-wide Preferences.cfg in the warehouse.
-#include "FuzzSupport.h"
+#include "FuzzToolkit.h"
 #include "db/HFDatabase.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {
-    fuzzsupport::InitialiseOnce();
+    fuzzsupport::InitialiseToolkitOnce();
     static const std::string file = fuzzsupport::WarehouseDirectory() + "/Preferences.cfg";
     fuzzsupport::WriteScratchFile(file, data, size);
 

@@ -3,12 +3,12 @@
 // into its own element walk.
 #include <vector>
 
-#include "FuzzSupport.h"
+#include "FuzzToolkit.h"
 #include "db/PluginInitialize.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {
-    fuzzsupport::InitialiseOnce();
+    fuzzsupport::InitialiseToolkitOnce();
     const wxString xml = fuzzsupport::TextOf(data, size);
 
     std::vector<stPageAttribute> sheets;

@@ -103,7 +103,7 @@ bool ApplySettingAssignments(wxXmlNode* filter, const std::vector<std::string>& 
     {
         MapPropToValue pageKeys;
         WriteSheetPageKeys(pageKeys, *paper);
-        pageKeys[SettingsKeys::CUSTOMPAGESIZE] = "0";
+        pageKeys[SettingsKeys::CUSTOMPAGESIZE] = FormatSettingFlag(false);
         for (const auto& entry : pageKeys)
             WriteFilterSetting(filter, entry.first, entry.second);
     }

@@ -1,51 +1,9 @@
 #include "module/SettingCatalogue.h"
 
 #include <cmath>
-#include <utility>
-
-#include "SettingsKeys.h"
 
 namespace
 {
-using namespace SettingsKeys;
-
-const std::pair<const char*, SettingKind> kCatalogue[] = {
-    {OUTPUTFILETYPEEPS, SettingKind::Flag},
-    {OUTPUTFILETYPEPS, SettingKind::Flag},
-    {CUSTOMPAGESIZE, SettingKind::Flag},
-    {DEFAULTPAGESIZE, SettingKind::PaperName},
-    {ORIENTATIONPOTRAIT, SettingKind::Flag},
-    {ORIENTATIONLANDSCAPE, SettingKind::Flag},
-    {AUTOROTATE, SettingKind::Flag},
-    {IMAGEPOSITION, SettingKind::ImagePosition},
-    {FORCEPAGESIZEX, SettingKind::Points},
-    {FORCEPAGESIZEY, SettingKind::Points},
-    {IMAGEEABLESIZELLX, SettingKind::Points},
-    {IMAGEEABLESIZELLY, SettingKind::Points},
-    {IMAGEEABLESIZEURX, SettingKind::Points},
-    {IMAGEEABLESIZEURY, SettingKind::Points},
-    {PAGESIZE_COMMAND, SettingKind::Text},
-    {CUSTOMPAGEWIDTH, SettingKind::Points},
-    {CUSTOMPAGEHEIGHT, SettingKind::Points},
-    {CUSTOMPAGETUNIT, SettingKind::UnitNumber},
-    {ORIGINALSIZE, SettingKind::Flag},
-    {CUSTOMSIZE, SettingKind::Flag},
-    {CONTRAINPROPORTION, SettingKind::Flag},
-    {ORIGINALWIDTHOPTION, SettingKind::Flag},
-    {ORIGINALHEIGHTOPTION, SettingKind::Flag},
-    {ORIGINALWIDTH, SettingKind::Length},
-    {ORIGINALHEIGHT, SettingKind::Length},
-    {ORIGINALWIDTHUNIT, SettingKind::UnitWord},
-    {ORIGINALHEIGHTUNIT, SettingKind::UnitWord},
-    {FORCEAUTOSCALE, SettingKind::Flag},
-    {FITTOPAGE, SettingKind::Flag},
-    {SHRINKTOFIT, SettingKind::Flag},
-    {SCALETOPRINT, SettingKind::Flag},
-};
-
-const char* const kImagePositions[] = {"Top Left", "Top Right", "Center", "Bottom Left",
-                                       "Bottom Right"};
-
 bool ParseNumber(const wxString& text, double& number)
 {
     wxString dotted = text.Strip(wxString::both);
@@ -53,25 +11,6 @@ bool ParseNumber(const wxString& text, double& number)
     return !dotted.empty() && dotted.ToCDouble(&number) && std::isfinite(number);
 }
 } // namespace
-
-bool LookUpSettingKind(const wxString& key, SettingKind& kind)
-{
-    for (const auto& entry : kCatalogue)
-        if (key == entry.first)
-        {
-            kind = entry.second;
-            return true;
-        }
-    return false;
-}
-
-wxArrayString KnownSettingKeys()
-{
-    wxArrayString keys;
-    for (const auto& entry : kCatalogue)
-        keys.Add(entry.first);
-    return keys;
-}
 
 bool NormaliseSettingValue(const wxString& key, const wxString& value, wxString& stored,
                            wxString& error)
@@ -89,10 +28,11 @@ bool NormaliseSettingValue(const wxString& key, const wxString& value, wxString&
     case SettingKind::Flag:
     {
         wxString word = value.Lower();
-        if (word == "1" || word == "yes" || word == "true" || word == "on")
-            stored = "1";
-        else if (word == "0" || word == "no" || word == "false" || word == "off")
-            stored = "0";
+        if (word == FormatSettingFlag(true) || word == "yes" || word == "true" || word == "on")
+            stored = FormatSettingFlag(true);
+        else if (word == FormatSettingFlag(false) || word == "no" || word == "false" ||
+                 word == "off")
+            stored = FormatSettingFlag(false);
         else
         {
             error = wxString::Format("%s takes 1 or 0 (yes/no), not \"%s\"", key, value);
@@ -119,7 +59,8 @@ bool NormaliseSettingValue(const wxString& key, const wxString& value, wxString&
         stored.Replace(",", ".");
         return true;
     case SettingKind::UnitWord:
-        if (value != "inch" && value != "mm" && value != "point")
+        if (value != UnitWord(UNIT_INCH) && value != UnitWord(UNIT_MM) &&
+            value != UnitWord(UNIT_POINT))
         {
             error = wxString::Format("%s takes inch, mm or point, not \"%s\"", key, value);
             return false;
@@ -127,16 +68,19 @@ bool NormaliseSettingValue(const wxString& key, const wxString& value, wxString&
         stored = value;
         return true;
     case SettingKind::UnitNumber:
-        if (value != "0" && value != "1" && value != "2")
+    {
+        Unit_t unit = UNIT_INCH;
+        if (value.empty() || !DecodeCustomPageUnit(value, unit))
         {
             error =
                 wxString::Format("%s takes 0 (inch), 1 (mm) or 2 (point), not \"%s\"", key, value);
             return false;
         }
-        stored = value;
+        stored = EncodeCustomPageUnit(unit);
         return true;
+    }
     case SettingKind::ImagePosition:
-        for (const char* position : kImagePositions)
+        for (const char* position : kImagePositionWords)
             if (value.IsSameAs(position, false))
             {
                 stored = position;

@@ -4,6 +4,7 @@
 
 #include "ErrorCodes.h"
 #include "FilterVersion.h"
+#include "SettingsKeys.h"
 
 const wxString ERRORDIFFUSION_KEY = "ErrorDiffusion";
 const wxString IMAGEPRIORITY_KEY = "Quality";
@@ -16,7 +17,7 @@ const char* const kDisplayName = "EPS";
 
 EPS::EPS(wxString) : m_settings(100)
 {
-    m_settings["OUTPUTFILETYPEEPS"] = wxString::Format("%d", 1);
+    m_settings[SettingsKeys::OUTPUTFILETYPEEPS] = FormatSettingFlag(true);
     std::memset(&m_params, 0, sizeof m_params);
     m_params.pageWidth = 595.0;
     m_params.pageHeight = 843.0; // 843, not 842: hosts depend on this default

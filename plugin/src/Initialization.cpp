@@ -2,6 +2,7 @@
 #include <wx/xml/xml.h>
 
 #include "EPS.h"
+#include "SettingsKeys.h"
 #include "XmlHelper.h"
 #include "db/PluginInitialize.h"
 
@@ -43,7 +44,7 @@ void EPS::ReadUIElement(wxXmlNode* node)
 long EPS::InitilaizeFromPreference(wxXmlNode* preference)
 {
     ReadUIElement(preference);
-    m_bOutputTypeIsOne = m_settings["OUTPUTFILETYPEEPS"] == "1";
+    m_bOutputTypeIsOne = IsSettingOn(m_settings[SettingsKeys::OUTPUTFILETYPEEPS]);
     LoadEPSParams();
     return m_lStatus = 0;
 }

@@ -2,26 +2,30 @@
 #include <wx/filename.h>
 
 #include "EPS.h"
+#include "SettingsKeys.h"
 #include "db/ConfigurationReader.h"
 #include "db/HFDatabase.h"
 #include "db/JobConfiguration.h"
 
 bool EPS::WriteJobOverrides(wxString folder)
 {
-    (void)m_settings["PAGESIZE_COMMAND"];
+    using namespace SettingsKeys;
+    // Indexing inserts the key with an empty value, so the saved preferences
+    // always carry a page size command, written by a panel or not.
+    (void)m_settings[PAGESIZE_COMMAND];
     if (m_lStatus != 0)
         return true;
 
     wxArrayString keys, values;
     if (!m_bOutputTypeIsOne)
     {
-        wxString pageSize = m_settings["DEFAULTPAGESIZE"];
-        if (m_settings["CUSTOMPAGESIZE"] == "1")
+        wxString pageSize = m_settings[DEFAULTPAGESIZE];
+        if (IsSettingOn(m_settings[CUSTOMPAGESIZE]))
         {
             keys.Add("PageSize");
             values.Add("Custom");
             keys.Add("CustomPageSize");
-            values.Add(m_settings["FORCEPAGESIZEX"] + " " + m_settings["FORCEPAGESIZEY"]);
+            values.Add(m_settings[FORCEPAGESIZEX] + " " + m_settings[FORCEPAGESIZEY]);
         }
         else
         {

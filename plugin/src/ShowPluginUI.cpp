@@ -1,6 +1,7 @@
 #include "EPS.h"
 #include "ImageSizePanelWithoutMerge.h"
 #include "PanelFactories.h"
+#include "SettingsKeys.h"
 #include "Units.h"
 #include "db/PluginInitialize.h"
 
@@ -17,8 +18,7 @@ wxWindow* EPS::ShowPluginUI(wxWindow* parent)
     wxString unit;
     if (!PluginInitialize::InitializePreferenceUnit(m_strServerDescription, unit))
         unit.clear();
-    m_settings["CUSTOMPAGETUNIT"] =
-        wxString::Format("%d", static_cast<int>(UnitFromServerWord(unit)));
+    m_settings[SettingsKeys::CUSTOMPAGETUNIT] = EncodeCustomPageUnit(UnitFromServerWord(unit));
 
     m_pSettingsPanel->LoadUISettings(m_settings);
     LoadEPSParams();

@@ -1,7 +1,7 @@
 #pragma once
 #include <wx/textctrl.h>
 
-// Text field of the image size view. Losing the focus does nothing: the
+// Text field of the image size view. Losing the focus checks nothing: the
 // values are checked when the panel is saved, not when the user tabs away.
 class CustomTextCtrl : public wxTextCtrl
 {
@@ -11,5 +11,6 @@ public:
                    long style = 0);
 
 private:
-    void OnKillFocus(wxFocusEvent&) {}
+    // Passed on, so the toolkit's own focus handling (caret, selection) runs.
+    void OnKillFocus(wxFocusEvent& event) { event.Skip(); }
 };

@@ -59,9 +59,8 @@ protected:
     bool m_bShrinkToFit = false;
     bool m_bScaleToPrint = false;
     bool m_bImageSectionEnabled;
-    bool m_bImageSecondFlag;
-    wxString m_strWidth = "0.25";
-    wxString m_strHeight = "0.25";
+    wxString m_strWidth;
+    wxString m_strHeight;
     wxString m_strWidthUnit;
     wxString m_strHeightUnit;
     wxString m_strDecimalSeparator;

@@ -37,8 +37,6 @@ protected:
     bool m_bPSOutput = false;
     bool m_bPDFOutput = false;
     bool m_bOutputSectionEnabled;
-    bool m_bOutputSecondFlag;
-    wxArrayString m_arrNames;
     bool m_bPageControlsDisabled = false;
 
 private:

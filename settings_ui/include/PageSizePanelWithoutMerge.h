@@ -48,7 +48,6 @@ protected:
     bool m_bAutoRotate = false;
     bool m_bCustomPageSize = false;
     bool m_bPageSectionEnabled;
-    bool m_bPageSecondFlag;
     double m_dCustomWidth = 0;  // points between operations
     double m_dCustomHeight = 0; // points between operations
     wxString m_strPageSize;

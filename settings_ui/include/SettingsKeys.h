@@ -1,5 +1,6 @@
 #pragma once
 #include <hotfolder/MapPropToValue.h>
+#include <wx/arrstr.h>
 #include <wx/string.h>
 
 #include "Units.h"
@@ -47,6 +48,12 @@ constexpr char SHRINKTOFIT[] = "SHRINKTOFIT";
 constexpr char SCALETOPRINT[] = "SCALETOPRINT";
 } // namespace SettingsKeys
 
+// English source texts of the five image positions, in the order the panel
+// lists them. The panel stores the translation shown; readers look the
+// stored text up among every language's translations of these words.
+constexpr const char* kImagePositionWords[] = {"Top Left", "Top Right", "Center", "Bottom Left",
+                                               "Bottom Right"};
+
 // Defaults of the flags when their value is empty. Keys without an entry
 // here either have a computed default (below) or are not read by a panel.
 namespace SettingsDefaults
@@ -67,8 +74,28 @@ constexpr bool FITTOPAGE = true;
 constexpr bool SHRINKTOFIT = false;
 constexpr bool SCALETOPRINT = false;
 // English source text; panels show and store its translation.
-constexpr char IMAGEPOSITION[] = "Center";
+constexpr const char* IMAGEPOSITION = kImagePositionWords[2];
 } // namespace SettingsDefaults
+
+// What each key holds, so that every writer, the command line included,
+// stores what the panel and the conversion-parameter loading read.
+enum class SettingKind
+{
+    Flag,          // "1" or "0"
+    Points,        // a length in points, "%f" with "."
+    Length,        // a length in the unit of its companion key, "." decimals
+    UnitWord,      // a unit word: "inch", "mm" or "point", or its translation
+    UnitNumber,    // 0 inch, 1 millimetre, 2 point
+    ImagePosition, // one of kImagePositionWords, or its translation
+    PaperName,     // a paper of the server's list
+    Text           // stored as given
+};
+
+// False when the key is not a setting of the filter.
+bool LookUpSettingKind(const wxString& key, SettingKind& kind);
+
+// Every key of the filter, in catalogue order.
+wxArrayString KnownSettingKeys();
 
 // Value encodings. Every reader indexes the map, which leaves an empty
 // entry behind for an absent key; empty always means "use the default".
@@ -88,14 +115,19 @@ wxString FormatSettingInt(long value);
 // when the text is empty or not entirely a number (value then holds the
 // leading number, 0 when there is none).
 bool ParseSettingDouble(const wxString& text, double& value);
-
-// "OUTPUTFILETYPEPS" when empty: false while "OUTPUTFILETYPEEPS" is empty
-// too, else the negation of that flag.
-bool ReadOutputFileTypePS(MapPropToValue& settings);
+// The measure under key for the converter: the stored "." form first, then
+// the process locale's own form (values typed by older panels while the
+// application language had switched the C locale); 0 when neither reads.
+double ReadSettingNumber(MapPropToValue& settings, const wxString& key);
 
 // "CUSTOMPAGETUNIT": empty or "0" inch, "1" millimetre, "2" point. Any other
 // text returns false and leaves unit as it was.
 bool DecodeCustomPageUnit(const wxString& value, Unit_t& unit);
+wxString EncodeCustomPageUnit(Unit_t unit);
+
+// "ORIGINALWIDTHUNIT" / "ORIGINALHEIGHTUNIT": the unit word in any language;
+// a word that is neither inch nor millimetre counts as point.
+Unit_t DecodeDimensionUnit(const wxString& storedWord);
 
 // "ORIGINALWIDTH" / "ORIGINALHEIGHT" when empty: a quarter inch, written
 // in the field's unit ("0.25" for inch, "6.35" for anything else).

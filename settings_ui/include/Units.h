@@ -38,6 +38,9 @@ bool GetValueInUnits(double& value, Unit2_t from, Unit2_t to);
 // as points). Always with "." because the text can be stored as a page size.
 wxString formatUnit(double value, Unit_t unit);
 
-// Unit of the server's preference word ("inch", "mm", "point"); any other
-// word gives inch.
+// The unit's English word: "inch", "mm" or "point". The server names its
+// preferred unit so, and the panels show and store its translation.
+const char* UnitWord(Unit_t unit);
+
+// Unit of the server's preference word; any other word gives inch.
 Unit_t UnitFromServerWord(const wxString& word);

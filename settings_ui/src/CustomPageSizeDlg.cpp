@@ -89,14 +89,15 @@ void CustomPageSizeDlg::CreateControls()
 
     auto* units = new wxStaticBoxSizer(wxHORIZONTAL, this, TranslateUiText("Units"));
     units->Add(new wxRadioButton(units->GetStaticBox(), ID_CUSTOM_UNIT_INCH,
-                                 TranslateUiText("inch"), wxDefaultPosition, wxDefaultSize,
-                                 wxRB_GROUP),
+                                 TranslateUiText(UnitWord(UNIT_INCH)), wxDefaultPosition,
+                                 wxDefaultSize, wxRB_GROUP),
                0, wxALL, 5);
-    units->Add(new wxRadioButton(units->GetStaticBox(), ID_CUSTOM_UNIT_MM, TranslateUiText("mm")),
+    units->Add(new wxRadioButton(units->GetStaticBox(), ID_CUSTOM_UNIT_MM,
+                                 TranslateUiText(UnitWord(UNIT_MM))),
                0, wxALL, 5);
-    units->Add(
-        new wxRadioButton(units->GetStaticBox(), ID_CUSTOM_UNIT_POINT, TranslateUiText("point")), 0,
-        wxALL, 5);
+    units->Add(new wxRadioButton(units->GetStaticBox(), ID_CUSTOM_UNIT_POINT,
+                                 TranslateUiText(UnitWord(UNIT_POINT))),
+               0, wxALL, 5);
 
     // Stock buttons: OK is the default (Enter) and Cancel answers Escape.
     auto* buttons = new wxStdDialogButtonSizer();

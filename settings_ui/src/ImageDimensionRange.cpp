@@ -1,13 +1,14 @@
 #include "ImageDimensionRange.h"
 
 #include "UiText.h"
+#include "Units.h"
 
 ImageDimensionCheck CheckImageDimension(double value, const wxString& unitText)
 {
     ImageDimensionCheck check;
     // The mm limits are not the inch limits converted; that is what the
     // engine has always accepted.
-    if (unitText.IsSameAs(TranslateUiText("inch"), false))
+    if (unitText.IsSameAs(TranslateUiText(UnitWord(UNIT_INCH)), false))
     {
         check.valid = value >= 0.25 && value <= 48;
         if (!check.valid)
@@ -16,7 +17,7 @@ ImageDimensionCheck CheckImageDimension(double value, const wxString& unitText)
             check.resetText = TranslateUiText("0.25");
         }
     }
-    else if (unitText.IsSameAs(TranslateUiText("mm"), false))
+    else if (unitText.IsSameAs(TranslateUiText(UnitWord(UNIT_MM)), false))
     {
         check.valid = value >= 5 && value <= 1220;
         if (!check.valid)

@@ -11,6 +11,7 @@
 #include "ControlIds.h"
 #include "ImageDimensionRange.h"
 #include "NumericValidator.h"
+#include "SettingsKeys.h"
 #include "UiText.h"
 #include "utils/CLocaleNumbers.h"
 #include "utils/HFHelper.h"
@@ -23,23 +24,17 @@ const int kImageControls[] = {ID_ORIGINALSIZE_RADIO, ID_CUSTOMSIZE_RADIO, ID_CON
                               ID_AUTOSCALE_RADIO,    ID_FITTOPAGE_RADIO,  ID_SHRINKTOFIT_RADIO,
                               ID_SCALETOPRINT_CHECK};
 
-wxString FlagText(bool on)
+wxString InchText()
 {
-    return wxString::Format("%d", on);
-}
-
-bool ReadFlag(MapPropToValue& settings, const char* key, bool defaultValue)
-{
-    const wxString value = settings[key];
-    return value.empty() ? defaultValue : value == "1";
+    return TranslateUiText(UnitWord(UNIT_INCH));
 }
 } // namespace
 
 ImageSizePanelWithoutMerge::ImageSizePanelWithoutMerge(wxWindow* parent, bool enabled,
                                                        bool secondFlag)
     : PageSizePanelWithoutMerge(parent, enabled, secondFlag), m_bImageSectionEnabled(enabled),
-      m_bImageSecondFlag(secondFlag), m_strWidthUnit(TranslateUiText("inch")),
-      m_strHeightUnit(TranslateUiText("inch"))
+      m_strWidth(DefaultOriginalDimension(true)), m_strHeight(DefaultOriginalDimension(true)),
+      m_strWidthUnit(InchText()), m_strHeightUnit(InchText())
 {
     using Self = ImageSizePanelWithoutMerge;
     Bind(wxEVT_RADIOBUTTON, &Self::OnRadioOriginalSize, this, ID_ORIGINALSIZE_RADIO);
@@ -60,7 +55,8 @@ ImageSizePanelWithoutMerge::ImageSizePanelWithoutMerge(wxWindow* parent, bool en
 void ImageSizePanelWithoutMerge::SetMeasurementUnit(const wxString& preferredUnit,
                                                     const wxString& systemUnit)
 {
-    m_strMeasurementUnit = preferredUnit.IsSameAs("point", false) ? systemUnit : preferredUnit;
+    m_strMeasurementUnit =
+        preferredUnit.IsSameAs(UnitWord(UNIT_POINT), false) ? systemUnit : preferredUnit;
 }
 
 void ImageSizePanelWithoutMerge::SetDecimalSeparator(wxString& separator)
@@ -253,7 +249,7 @@ void ImageSizePanelWithoutMerge::ChangeFieldUnit(int comboId, int textId, wxStri
     wxString plain = field->GetValue();
     FormatDataAsPerDecimalSeparator(plain, true);
     double value = utils::StrToDoubleC(plain);
-    if (unitText != TranslateUiText("inch"))
+    if (unitText != InchText())
         convertToUnit(value, UNIT_INCH, UNIT_MM);
     else
         convertToUnit(value, UNIT_MM, UNIT_INCH);
@@ -319,24 +315,25 @@ bool ImageSizePanelWithoutMerge::SaveUISettings(MapPropToValue& settings)
     if (!m_bImageSectionEnabled)
         return true;
     PageSizePanelWithoutMerge::SaveUISettings(settings);
-    settings["ORIGINALSIZE"] = FlagText(m_bOriginalSize);
-    settings["CUSTOMSIZE"] = FlagText(m_bCustomSize);
-    settings["CONTRAINPROPORTION"] = FlagText(m_bConstrain);
-    settings["ORIGINALWIDTHOPTION"] = FlagText(m_bWidthDrives);
-    settings["ORIGINALHEIGHTOPTION"] = FlagText(m_bHeightDrives);
+    using namespace SettingsKeys;
+    settings[ORIGINALSIZE] = FormatSettingFlag(m_bOriginalSize);
+    settings[CUSTOMSIZE] = FormatSettingFlag(m_bCustomSize);
+    settings[CONTRAINPROPORTION] = FormatSettingFlag(m_bConstrain);
+    settings[ORIGINALWIDTHOPTION] = FormatSettingFlag(m_bWidthDrives);
+    settings[ORIGINALHEIGHTOPTION] = FormatSettingFlag(m_bHeightDrives);
 
     wxString width = m_strWidth, height = m_strHeight;
     FormatDataAsPerDecimalSeparator(width, true);
     FormatDataAsPerDecimalSeparator(height, true);
-    settings["ORIGINALWIDTH"] = width;
-    settings["ORIGINALWIDTHUNIT"] = m_strWidthUnit;
-    settings["ORIGINALHEIGHT"] = height;
-    settings["ORIGINALHEIGHTUNIT"] = m_strHeightUnit;
+    settings[ORIGINALWIDTH] = width;
+    settings[ORIGINALWIDTHUNIT] = m_strWidthUnit;
+    settings[ORIGINALHEIGHT] = height;
+    settings[ORIGINALHEIGHTUNIT] = m_strHeightUnit;
 
-    settings["FORCEAUTOSCALE"] = FlagText(m_bAutoScale);
-    settings["FITTOPAGE"] = FlagText(m_bFitToPage);
-    settings["SHRINKTOFIT"] = FlagText(m_bShrinkToFit);
-    settings["SCALETOPRINT"] = FlagText(m_bScaleToPrint);
+    settings[FORCEAUTOSCALE] = FormatSettingFlag(m_bAutoScale);
+    settings[FITTOPAGE] = FormatSettingFlag(m_bFitToPage);
+    settings[SHRINKTOFIT] = FormatSettingFlag(m_bShrinkToFit);
+    settings[SCALETOPRINT] = FormatSettingFlag(m_bScaleToPrint);
     // Written before the check on purpose: a refused save keeps what was typed.
     return ValidateData();
 }
@@ -345,30 +342,33 @@ bool ImageSizePanelWithoutMerge::LoadUISettings(MapPropToValue& settings)
 {
     if (!m_bImageSectionEnabled)
         return true;
-    m_bOriginalSize = ReadFlag(settings, "ORIGINALSIZE", true);
-    m_bCustomSize = ReadFlag(settings, "CUSTOMSIZE", false);
-    m_bConstrain = ReadFlag(settings, "CONTRAINPROPORTION", true);
-    m_bAutoScale = ReadFlag(settings, "FORCEAUTOSCALE", false);
-    m_bFitToPage = ReadFlag(settings, "FITTOPAGE", true);
-    m_bShrinkToFit = ReadFlag(settings, "SHRINKTOFIT", false);
-    m_bScaleToPrint = ReadFlag(settings, "SCALETOPRINT", false);
-    m_bWidthDrives = ReadFlag(settings, "ORIGINALWIDTHOPTION", true);
-    m_bHeightDrives = ReadFlag(settings, "ORIGINALHEIGHTOPTION", false);
+    using namespace SettingsKeys;
+    namespace Defaults = SettingsDefaults;
+    m_bOriginalSize = ReadSettingFlag(settings, ORIGINALSIZE, Defaults::ORIGINALSIZE);
+    m_bCustomSize = ReadSettingFlag(settings, CUSTOMSIZE, Defaults::CUSTOMSIZE);
+    m_bConstrain = ReadSettingFlag(settings, CONTRAINPROPORTION, Defaults::CONTRAINPROPORTION);
+    m_bAutoScale = ReadSettingFlag(settings, FORCEAUTOSCALE, Defaults::FORCEAUTOSCALE);
+    m_bFitToPage = ReadSettingFlag(settings, FITTOPAGE, Defaults::FITTOPAGE);
+    m_bShrinkToFit = ReadSettingFlag(settings, SHRINKTOFIT, Defaults::SHRINKTOFIT);
+    m_bScaleToPrint = ReadSettingFlag(settings, SCALETOPRINT, Defaults::SCALETOPRINT);
+    m_bWidthDrives = ReadSettingFlag(settings, ORIGINALWIDTHOPTION, Defaults::ORIGINALWIDTHOPTION);
+    m_bHeightDrives =
+        ReadSettingFlag(settings, ORIGINALHEIGHTOPTION, Defaults::ORIGINALHEIGHTOPTION);
 
-    const wxString inch = TranslateUiText("inch");
+    const wxString inch = InchText();
     auto loadDimension =
         [&](bool drives, const char* unitKey, const char* valueKey, wxString& unit, wxString& value)
     {
-        unit = TranslateUiText(m_strMeasurementUnit.empty() ? "inch" : m_strMeasurementUnit);
+        unit = m_strMeasurementUnit.empty() ? inch : TranslateUiText(m_strMeasurementUnit);
         const wxString storedUnit = settings[unitKey];
         if ((!m_bConstrain || drives) && !storedUnit.empty())
             unit = storedUnit;
         const wxString storedValue = settings[valueKey];
-        value = !storedValue.empty() ? storedValue : unit == inch ? "0.25" : "6.35";
+        value = !storedValue.empty() ? storedValue : DefaultOriginalDimension(unit == inch);
         FormatDataAsPerDecimalSeparator(value, false);
     };
-    loadDimension(m_bWidthDrives, "ORIGINALWIDTHUNIT", "ORIGINALWIDTH", m_strWidthUnit, m_strWidth);
-    loadDimension(m_bHeightDrives, "ORIGINALHEIGHTUNIT", "ORIGINALHEIGHT", m_strHeightUnit,
+    loadDimension(m_bWidthDrives, ORIGINALWIDTHUNIT, ORIGINALWIDTH, m_strWidthUnit, m_strWidth);
+    loadDimension(m_bHeightDrives, ORIGINALHEIGHTUNIT, ORIGINALHEIGHT, m_strHeightUnit,
                   m_strHeight);
 
     HandleCustomSizeSelection(m_bCustomSize, m_bWidthDrives, m_bHeightDrives);

@@ -9,14 +9,15 @@
 #include "PanelTheme.h"
 #include "SettingsViews.h"
 #include "UiText.h"
+#include "Units.h"
 
 namespace
 {
 wxComboBox* CreateUnitCombo(wxWindow* parent, int id)
 {
     wxArrayString units;
-    units.Add(TranslateUiText("inch"));
-    units.Add(TranslateUiText("mm"));
+    units.Add(TranslateUiText(UnitWord(UNIT_INCH)));
+    units.Add(TranslateUiText(UnitWord(UNIT_MM)));
     return new wxComboBox(parent, id, wxEmptyString, wxDefaultPosition, wxDefaultSize, units,
                           wxCB_DROPDOWN | wxCB_READONLY);
 }

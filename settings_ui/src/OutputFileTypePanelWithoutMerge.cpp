@@ -6,11 +6,13 @@
 #include "ControlIds.h"
 #include "EnablingRules.h"
 #include "PanelTheme.h"
+#include "SettingsKeys.h"
 
+// The second flag is part of every section's constructor; no section uses it.
 OutputFileTypePanelWithoutMerge::OutputFileTypePanelWithoutMerge(wxWindow* parent, bool enabled,
-                                                                 bool secondFlag)
+                                                                 bool /*secondFlag*/)
     : wxPanel(parent, wxID_ANY, wxDefaultPosition, wxDefaultSize, wxTAB_TRAVERSAL | wxNO_BORDER),
-      m_bOutputSectionEnabled(enabled), m_bOutputSecondFlag(secondFlag)
+      m_bOutputSectionEnabled(enabled)
 {
     // The views nest their controls in static boxes; validators must reach them.
     SetExtraStyle(GetExtraStyle() | wxWS_EX_VALIDATE_RECURSIVELY);
@@ -37,8 +39,8 @@ bool OutputFileTypePanelWithoutMerge::SaveUISettings(MapPropToValue& settings)
 {
     if (!m_bOutputSectionEnabled)
         return true;
-    settings["OUTPUTFILETYPEEPS"] = wxString::Format("%d", m_bEPSOutput);
-    settings["OUTPUTFILETYPEPS"] = wxString::Format("%d", m_bPSOutput);
+    settings[SettingsKeys::OUTPUTFILETYPEEPS] = FormatSettingFlag(m_bEPSOutput);
+    settings[SettingsKeys::OUTPUTFILETYPEPS] = FormatSettingFlag(m_bPSOutput);
     return true;
 }
 
@@ -46,8 +48,8 @@ bool OutputFileTypePanelWithoutMerge::LoadUISettings(MapPropToValue& settings)
 {
     if (!m_bOutputSectionEnabled)
         return true;
-    const wxString eps = settings["OUTPUTFILETYPEEPS"];
-    m_bEPSOutput = eps.empty() || eps == "1";
+    m_bEPSOutput = ReadSettingFlag(settings, SettingsKeys::OUTPUTFILETYPEEPS,
+                                   SettingsDefaults::OUTPUTFILETYPEEPS);
     m_bPSOutput = !m_bEPSOutput;
     TransferDataToWindow();
     if (m_bEPSOutput)

@@ -8,14 +8,15 @@
 #include "ControlIds.h"
 #include "CustomPageSizeDlg.h"
 #include "PageSizeKeys.h"
+#include "SettingsKeys.h"
 #include "UiText.h"
-#include "utils/CLocaleNumbers.h"
 
 PageSizePanelWithoutMerge::PageSizePanelWithoutMerge(wxWindow* parent, bool enabled,
                                                      bool secondFlag)
     : OutputFileTypePanelWithoutMerge(parent, enabled, secondFlag), m_bPageSectionEnabled(enabled),
-      m_bPageSecondFlag(secondFlag), m_strPageSize("Default Size"),
-      m_strImagePosition(TranslateUiText("Center")), m_eMeasurementUnit(UNIT_INCH)
+      m_strPageSize("Default Size"),
+      m_strImagePosition(TranslateUiText(SettingsDefaults::IMAGEPOSITION)),
+      m_eMeasurementUnit(SettingsDefaults::CUSTOMPAGETUNIT)
 {
     m_arrPageSizeNames.Add("Default Size");
     Bind(wxEVT_BUTTON, &PageSizePanelWithoutMerge::OnCustomPageSize, this,
@@ -102,23 +103,24 @@ bool PageSizePanelWithoutMerge::SaveUISettings(MapPropToValue& settings)
 {
     if (!m_bPageSectionEnabled)
         return true;
+    using namespace SettingsKeys;
     if (auto* paper = wxDynamicCast(FindWindow(ID_PAGESIZE_COMBO), wxComboBox))
     {
         if (!m_arrPageSizeNames.empty() &&
             m_arrPageSizeNames.Index(paper->GetValue()) != wxNOT_FOUND)
         {
             m_bCustomPageSize = false;
-            settings["CUSTOMPAGESIZE"] = "0";
+            settings[CUSTOMPAGESIZE] = FormatSettingFlag(false);
         }
     }
     OutputFileTypePanelWithoutMerge::SaveUISettings(settings);
 
     const stPageAttribute* sheet = FindSheetByDisplayName(m_sheets, m_strPageSize);
-    settings["DEFAULTPAGESIZE"] = sheet ? sheet->PaperName : m_strPageSize;
-    settings["ORIENTATIONPOTRAIT"] = wxString::Format("%d", m_bPortrait);
-    settings["ORIENTATIONLANDSCAPE"] = wxString::Format("%d", m_bLandscape);
-    settings["AUTOROTATE"] = wxString::Format("%d", m_bAutoRotate);
-    settings["IMAGEPOSITION"] = m_strImagePosition;
+    settings[DEFAULTPAGESIZE] = sheet ? sheet->PaperName : m_strPageSize;
+    settings[ORIENTATIONPOTRAIT] = FormatSettingFlag(m_bPortrait);
+    settings[ORIENTATIONLANDSCAPE] = FormatSettingFlag(m_bLandscape);
+    settings[AUTOROTATE] = FormatSettingFlag(m_bAutoRotate);
+    settings[IMAGEPOSITION] = m_strImagePosition;
     if (sheet)
         WriteSheetPageKeys(settings, *sheet);
     if (m_bCustomPageSize)
@@ -131,12 +133,13 @@ bool PageSizePanelWithoutMerge::LoadUISettings(MapPropToValue& settings)
 {
     if (!m_bPageSectionEnabled)
         return true;
-    const wxString portrait = settings["ORIENTATIONPOTRAIT"];
-    m_bPortrait = portrait.empty() || portrait == "1";
-    m_bLandscape = settings["ORIENTATIONLANDSCAPE"] == "1";
-    m_bAutoRotate = settings["AUTOROTATE"] == "1";
+    using namespace SettingsKeys;
+    namespace Defaults = SettingsDefaults;
+    m_bPortrait = ReadSettingFlag(settings, ORIENTATIONPOTRAIT, Defaults::ORIENTATIONPOTRAIT);
+    m_bLandscape = ReadSettingFlag(settings, ORIENTATIONLANDSCAPE, Defaults::ORIENTATIONLANDSCAPE);
+    m_bAutoRotate = ReadSettingFlag(settings, AUTOROTATE, Defaults::AUTOROTATE);
 
-    const wxString paperKey = settings["DEFAULTPAGESIZE"];
+    const wxString paperKey = settings[DEFAULTPAGESIZE];
     if (paperKey.empty())
     {
         if (!m_arrPageSizeNames.empty())
@@ -148,29 +151,24 @@ bool PageSizePanelWithoutMerge::LoadUISettings(MapPropToValue& settings)
         m_strPageSize = sheet ? sheet->PaperDisplayName : paperKey;
     }
 
-    const wxString position = settings["IMAGEPOSITION"];
-    m_strImagePosition = position.empty() ? TranslateUiText("Center") : position;
+    const wxString position = settings[IMAGEPOSITION];
+    m_strImagePosition = position.empty() ? TranslateUiText(Defaults::IMAGEPOSITION) : position;
 
-    const wxString width = settings["CUSTOMPAGEWIDTH"];
+    const wxString width = settings[CUSTOMPAGEWIDTH];
     if (!width.empty())
-        m_dCustomWidth = utils::StrToDoubleC(width);
+        ParseSettingDouble(width, m_dCustomWidth);
     else if (!m_sheets.empty())
         m_dCustomWidth = m_sheets.front().Width;
-    const wxString height = settings["CUSTOMPAGEHEIGHT"];
+    const wxString height = settings[CUSTOMPAGEHEIGHT];
     if (!height.empty())
-        m_dCustomHeight = utils::StrToDoubleC(height);
+        ParseSettingDouble(height, m_dCustomHeight);
     else if (!m_sheets.empty())
         m_dCustomHeight = m_sheets.front().Height;
 
-    const wxString unit = settings["CUSTOMPAGETUNIT"];
-    if (unit.empty() || unit == "0")
-        m_eMeasurementUnit = UNIT_INCH;
-    else if (unit == "1")
-        m_eMeasurementUnit = UNIT_MM;
-    else if (unit == "2")
-        m_eMeasurementUnit = UNIT_POINT;
+    // Text that is no unit code leaves the unit as it was.
+    DecodeCustomPageUnit(settings[CUSTOMPAGETUNIT], m_eMeasurementUnit);
 
-    m_bCustomPageSize = settings["CUSTOMPAGESIZE"] == "1";
+    m_bCustomPageSize = ReadSettingFlag(settings, CUSTOMPAGESIZE, Defaults::CUSTOMPAGESIZE);
     if (m_bCustomPageSize)
     {
         convertToUnit(m_dCustomWidth, UNIT_POINT, m_eMeasurementUnit);

@@ -6,6 +6,7 @@
 
 #include "ControlIds.h"
 #include "PanelTheme.h"
+#include "SettingsKeys.h"
 #include "SettingsViews.h"
 #include "UiText.h"
 
@@ -28,7 +29,7 @@ wxSizer* CreatePageViewEPS(wxWindow* parent, bool, bool)
     grid->Add(new wxStaticText(parent, ID_IMAGEPOSITION_LABEL, TranslateUiText("Image position:")),
               0, wxALIGN_CENTER_VERTICAL);
     wxArrayString positions;
-    for (const char* position : {"Top Left", "Top Right", "Center", "Bottom Left", "Bottom Right"})
+    for (const char* position : kImagePositionWords)
         positions.Add(TranslateUiText(position));
     grid->Add(new wxComboBox(parent, ID_IMAGEPOSITION_COMBO, wxEmptyString, wxDefaultPosition,
                              wxDefaultSize, positions, wxCB_DROPDOWN | wxCB_READONLY),

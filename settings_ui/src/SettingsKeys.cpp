@@ -1,6 +1,68 @@
 #include "SettingsKeys.h"
 
+#include <utility>
+
+#include <hotfolder/HFTranslations.h>
+
 #include "utils/CLocaleNumbers.h"
+
+namespace
+{
+using namespace SettingsKeys;
+
+const std::pair<const char*, SettingKind> kCatalogue[] = {
+    {OUTPUTFILETYPEEPS, SettingKind::Flag},
+    {OUTPUTFILETYPEPS, SettingKind::Flag},
+    {CUSTOMPAGESIZE, SettingKind::Flag},
+    {DEFAULTPAGESIZE, SettingKind::PaperName},
+    {ORIENTATIONPOTRAIT, SettingKind::Flag},
+    {ORIENTATIONLANDSCAPE, SettingKind::Flag},
+    {AUTOROTATE, SettingKind::Flag},
+    {IMAGEPOSITION, SettingKind::ImagePosition},
+    {FORCEPAGESIZEX, SettingKind::Points},
+    {FORCEPAGESIZEY, SettingKind::Points},
+    {IMAGEEABLESIZELLX, SettingKind::Points},
+    {IMAGEEABLESIZELLY, SettingKind::Points},
+    {IMAGEEABLESIZEURX, SettingKind::Points},
+    {IMAGEEABLESIZEURY, SettingKind::Points},
+    {PAGESIZE_COMMAND, SettingKind::Text},
+    {CUSTOMPAGEWIDTH, SettingKind::Points},
+    {CUSTOMPAGEHEIGHT, SettingKind::Points},
+    {CUSTOMPAGETUNIT, SettingKind::UnitNumber},
+    {ORIGINALSIZE, SettingKind::Flag},
+    {CUSTOMSIZE, SettingKind::Flag},
+    {CONTRAINPROPORTION, SettingKind::Flag},
+    {ORIGINALWIDTHOPTION, SettingKind::Flag},
+    {ORIGINALHEIGHTOPTION, SettingKind::Flag},
+    {ORIGINALWIDTH, SettingKind::Length},
+    {ORIGINALHEIGHT, SettingKind::Length},
+    {ORIGINALWIDTHUNIT, SettingKind::UnitWord},
+    {ORIGINALHEIGHTUNIT, SettingKind::UnitWord},
+    {FORCEAUTOSCALE, SettingKind::Flag},
+    {FITTOPAGE, SettingKind::Flag},
+    {SHRINKTOFIT, SettingKind::Flag},
+    {SCALETOPRINT, SettingKind::Flag},
+};
+} // namespace
+
+bool LookUpSettingKind(const wxString& key, SettingKind& kind)
+{
+    for (const auto& entry : kCatalogue)
+        if (key == entry.first)
+        {
+            kind = entry.second;
+            return true;
+        }
+    return false;
+}
+
+wxArrayString KnownSettingKeys()
+{
+    wxArrayString keys;
+    for (const auto& entry : kCatalogue)
+        keys.Add(entry.first);
+    return keys;
+}
 
 wxString FormatSettingFlag(bool on)
 {
@@ -35,13 +97,13 @@ bool ParseSettingDouble(const wxString& text, double& value)
     return complete;
 }
 
-bool ReadOutputFileTypePS(MapPropToValue& settings)
+double ReadSettingNumber(MapPropToValue& settings, const wxString& key)
 {
-    const wxString& ps = settings[SettingsKeys::OUTPUTFILETYPEPS];
-    if (!ps.empty())
-        return IsSettingOn(ps);
-    const wxString& eps = settings[SettingsKeys::OUTPUTFILETYPEEPS];
-    return eps.empty() ? false : !IsSettingOn(eps);
+    const wxString& text = settings[key];
+    double value = 0;
+    if (!text.ToCDouble(&value) && !text.ToDouble(&value))
+        value = 0;
+    return value;
 }
 
 bool DecodeCustomPageUnit(const wxString& value, Unit_t& unit)
@@ -55,6 +117,20 @@ bool DecodeCustomPageUnit(const wxString& value, Unit_t& unit)
     else
         return false;
     return true;
+}
+
+wxString EncodeCustomPageUnit(Unit_t unit)
+{
+    return FormatSettingInt(unit);
+}
+
+Unit_t DecodeDimensionUnit(const wxString& storedWord)
+{
+    const HFTranslations* translations = HFTranslations::GetInstance();
+    for (Unit_t unit : {UNIT_INCH, UNIT_MM})
+        if (translations->GetTranslations(UnitWord(unit)).Index(storedWord, true) != wxNOT_FOUND)
+            return unit;
+    return UNIT_POINT;
 }
 
 wxString DefaultOriginalDimension(bool fieldUnitIsInch)

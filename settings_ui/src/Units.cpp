@@ -70,11 +70,15 @@ wxString formatUnit(double value, Unit_t unit)
     return utils::FormatFixedC(value, 2) + suffix;
 }
 
+const char* UnitWord(Unit_t unit)
+{
+    return unit == UNIT_MM ? "mm" : unit == UNIT_POINT ? "point" : "inch";
+}
+
 Unit_t UnitFromServerWord(const wxString& word)
 {
-    if (word == "mm")
-        return UNIT_MM;
-    if (word == "point")
-        return UNIT_POINT;
+    for (Unit_t unit : {UNIT_MM, UNIT_POINT})
+        if (word == UnitWord(unit))
+            return unit;
     return UNIT_INCH;
 }

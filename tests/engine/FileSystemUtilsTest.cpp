@@ -58,11 +58,6 @@ bool IsImmutable(const std::string& path)
     return got && (flags & FS_IMMUTABLE_FL);
 }
 
-wxString Wx(const std::string& path)
-{
-    return wxString::FromUTF8(path.c_str());
-}
-
 // A small tree: a read-only file, a read-only folder holding a file, a
 // hidden file and a folder nobody may enter.
 void BuildTree(const std::string& root)
@@ -83,8 +78,8 @@ void BuildTree(const std::string& root)
 TEST(FileSystemUtils, MissingPathIsNotMadeWritable)
 {
     ScratchDir scratch;
-    EXPECT_FALSE(MakeFolderWritable(Wx(scratch.File("missing"))));
-    EXPECT_FALSE(MakeFolderWritable(wxString()));
+    EXPECT_FALSE(MakeFolderWritable(scratch.File("missing").c_str()));
+    EXPECT_FALSE(MakeFolderWritable(""));
 }
 
 TEST(FileSystemUtils, EveryEntryBecomesWritable)
@@ -92,7 +87,7 @@ TEST(FileSystemUtils, EveryEntryBecomesWritable)
     ScratchDir scratch;
     const std::string root = scratch.File("job");
     BuildTree(root);
-    EXPECT_TRUE(MakeFolderWritable(Wx(root)));
+    EXPECT_TRUE(MakeFolderWritable(root.c_str()));
     for (const char* entry : {"", "/readonly.txt", "/locked", "/locked/inner.txt", "/.hidden",
                               "/closed", "/closed/deep.txt"})
         EXPECT_EQ(Mode(root + entry), 0777u) << entry;
@@ -108,7 +103,7 @@ TEST(FileSystemUtils, DeleteRemovesTheTreeAndTheFolderItself)
         WriteBytes(root + "/frozen.txt", "f");
         return SetImmutable(root + "/frozen.txt", true);
     }();
-    DeleteFolderChildren(Wx(root));
+    DeleteFolderChildren(root.c_str());
     EXPECT_FALSE(Exists(root));
     if (!immutable)
         GTEST_SKIP() << "cannot set the immutable flag here; read-only entries were removed";
@@ -122,7 +117,7 @@ TEST(FileSystemUtils, ImmutableFlagIsCleared)
     WriteBytes(root + "/frozen.txt", "f");
     if (!SetImmutable(root + "/frozen.txt", true))
         GTEST_SKIP() << "cannot set the immutable flag here (needs CAP_LINUX_IMMUTABLE and ext4)";
-    EXPECT_TRUE(MakeFolderWritable(Wx(root)));
+    EXPECT_TRUE(MakeFolderWritable(root.c_str()));
     EXPECT_FALSE(IsImmutable(root + "/frozen.txt"));
     SetImmutable(root + "/frozen.txt", false); // lets the scratch folder go
 }
@@ -142,11 +137,11 @@ TEST(FileSystemUtils, LinksAreRemovedButNeverFollowed)
     ASSERT_EQ(symlink(outside.c_str(), (root + "/file-link").c_str()), 0);
     ASSERT_EQ(symlink(outsideDir.c_str(), (root + "/dir-link").c_str()), 0);
 
-    EXPECT_TRUE(MakeFolderWritable(Wx(root)));
+    EXPECT_TRUE(MakeFolderWritable(root.c_str()));
     EXPECT_EQ(Mode(outside), 0400u);
     EXPECT_EQ(Mode(outsideDir), 0700u);
 
-    DeleteFolderChildren(Wx(root));
+    DeleteFolderChildren(root.c_str());
     EXPECT_FALSE(Exists(root));
     EXPECT_EQ(ReadWholeFile(outside), "keep me");
     EXPECT_EQ(ReadWholeFile(outsideDir + "/keep.txt"), "keep");
@@ -167,9 +162,9 @@ TEST(FileSystemUtils, ShellCharactersInNamesAreJustCharacters)
         ASSERT_EQ(mkdir(root.c_str(), 0755), 0);
         WriteBytes(root + "/inner; touch pwned4", "x");
         chmod((root + "/inner; touch pwned4").c_str(), 0444);
-        EXPECT_TRUE(MakeFolderWritable(Wx(root)));
+        EXPECT_TRUE(MakeFolderWritable(root.c_str()));
         EXPECT_EQ(Mode(root + "/inner; touch pwned4"), 0777u);
-        DeleteFolderChildren(Wx(root));
+        DeleteFolderChildren(root.c_str());
         EXPECT_FALSE(Exists(root));
     }
     ASSERT_EQ(chdir(previous), 0);
@@ -193,8 +188,8 @@ TEST(FileSystemUtils, FailsWhereThePermissionIsNotOurs)
     {
         if (setgid(65534) != 0 || setuid(65534) != 0)
             _exit(90);
-        const bool writable = MakeFolderWritable(Wx(root));
-        DeleteFolderChildren(Wx(root));
+        const bool writable = MakeFolderWritable(root.c_str());
+        DeleteFolderChildren(root.c_str());
         _exit(writable ? 91 : 0);
     }
     int status = 0;

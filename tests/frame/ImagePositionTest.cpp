@@ -1,5 +1,4 @@
 #include <gtest/gtest.h>
-#include <hotfolder/HFTranslations.h>
 
 #include "ImagePosition.h"
 
@@ -17,21 +16,4 @@ TEST(ImagePositions, TablesBothWays)
     EXPECT_EQ(ConvertFromImgPos(FILTER_IMG_POS_TOP_RIGHT), IMG_POS_TOP_RIGHT);
     EXPECT_EQ(ConvertFromImgPos(static_cast<FilterImgPosition_t>(9)), IMG_POS_TOP_RIGHT);
     EXPECT_EQ(ConvertFromImgPos(FILTER_IMG_POS_CENTER), IMG_POS_CENTER);
-}
-
-TEST(ImagePositions, DisplayWordsInEveryLanguage)
-{
-    EXPECT_EQ(ConvertToImgPosStr("Top Left"), IMG_POS_TOP_LEFT);
-    EXPECT_EQ(ConvertToImgPosStr("Top Right"), IMG_POS_TOP_RIGHT);
-    EXPECT_EQ(ConvertToImgPosStr("Center"), IMG_POS_CENTER);
-    EXPECT_EQ(ConvertToImgPosStr("Bottom Right"), IMG_POS_BOTTOM_RIGHT);
-    EXPECT_EQ(ConvertToImgPosStr("Bottom Left"), IMG_POS_BOTTOM_LEFT);
-    // Exact and case-sensitive; anything else is the centre.
-    EXPECT_EQ(ConvertToImgPosStr("top left"), IMG_POS_CENTER);
-    EXPECT_EQ(ConvertToImgPosStr(""), IMG_POS_CENTER);
-    EXPECT_EQ(ConvertToImgPosStr("Bottom  Left"), IMG_POS_CENTER);
-    // Words stored by a German or French panel are found through the catalogues.
-    EXPECT_EQ(ConvertToImgPosStr("Unten links"), IMG_POS_BOTTOM_LEFT);
-    EXPECT_EQ(ConvertToImgPosStr("Oben rechts"), IMG_POS_TOP_RIGHT);
-    EXPECT_EQ(ConvertToImgPosStr(wxString::FromUTF8("En bas à droite")), IMG_POS_BOTTOM_RIGHT);
 }

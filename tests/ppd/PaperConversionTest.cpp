@@ -203,7 +203,7 @@ TEST_F(PaperConversion, CustomSizesThroughThePrintersOwnCode)
         const double height = std::floor((custom.MinMediaHeight + custom.MaxMediaHeight) / 2);
         MapPropToValue page;
         page["DEFAULTPAGESIZE"] = "Custom";
-        WriteCustomPageKeys(page, width, height, custom, static_cast<Unit_t>(2));
+        WriteCustomPageKeys(page, width, height, custom, UNIT_POINT);
         LoadSettings(server, page);
         Outcome outcome;
         Convert(custom.command, outcome);

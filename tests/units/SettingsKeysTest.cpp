@@ -49,18 +49,6 @@ TEST(SettingsFlags, EmptyValueTakesDefaultAndReadingInsertsKey)
     EXPECT_FALSE(ReadSettingFlag(settings, SettingsKeys::FITTOPAGE, SettingsDefaults::FITTOPAGE));
 }
 
-TEST(SettingsFlags, PostScriptOutputDefaultFollowsEpsFlag)
-{
-    MapPropToValue settings;
-    EXPECT_FALSE(ReadOutputFileTypePS(settings));
-    settings[SettingsKeys::OUTPUTFILETYPEEPS] = "0";
-    EXPECT_TRUE(ReadOutputFileTypePS(settings));
-    settings[SettingsKeys::OUTPUTFILETYPEEPS] = "1";
-    EXPECT_FALSE(ReadOutputFileTypePS(settings));
-    settings[SettingsKeys::OUTPUTFILETYPEPS] = "1";
-    EXPECT_TRUE(ReadOutputFileTypePS(settings));
-}
-
 TEST(SettingsMeasures, PrintfStyleWithPoint)
 {
     EXPECT_EQ("595.500000", FormatSettingDouble(595.5));
