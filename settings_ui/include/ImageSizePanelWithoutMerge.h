@@ -59,6 +59,7 @@ protected:
     bool m_bShrinkToFit = false;
     bool m_bScaleToPrint = false;
     bool m_bImageSectionEnabled;
+    bool m_bImageSecondFlag; // part of the section's data model; nothing reads it
     wxString m_strWidth;
     wxString m_strHeight;
     wxString m_strWidthUnit;

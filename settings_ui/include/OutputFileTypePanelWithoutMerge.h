@@ -37,6 +37,9 @@ protected:
     bool m_bPSOutput = false;
     bool m_bPDFOutput = false;
     bool m_bOutputSectionEnabled;
+    // Part of the section's data model; this filter reads neither.
+    bool m_bOutputSecondFlag;
+    wxArrayString m_arrNames;
     bool m_bPageControlsDisabled = false;
 
 private:

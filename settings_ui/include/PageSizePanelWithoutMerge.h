@@ -48,6 +48,7 @@ protected:
     bool m_bAutoRotate = false;
     bool m_bCustomPageSize = false;
     bool m_bPageSectionEnabled;
+    bool m_bPageSecondFlag;     // part of the section's data model; nothing reads it
     double m_dCustomWidth = 0;  // points between operations
     double m_dCustomHeight = 0; // points between operations
     wxString m_strPageSize;

@@ -33,8 +33,9 @@ wxString InchText()
 ImageSizePanelWithoutMerge::ImageSizePanelWithoutMerge(wxWindow* parent, bool enabled,
                                                        bool secondFlag)
     : PageSizePanelWithoutMerge(parent, enabled, secondFlag), m_bImageSectionEnabled(enabled),
-      m_strWidth(DefaultOriginalDimension(true)), m_strHeight(DefaultOriginalDimension(true)),
-      m_strWidthUnit(InchText()), m_strHeightUnit(InchText())
+      m_bImageSecondFlag(secondFlag), m_strWidth(DefaultOriginalDimension(true)),
+      m_strHeight(DefaultOriginalDimension(true)), m_strWidthUnit(InchText()),
+      m_strHeightUnit(InchText())
 {
     using Self = ImageSizePanelWithoutMerge;
     Bind(wxEVT_RADIOBUTTON, &Self::OnRadioOriginalSize, this, ID_ORIGINALSIZE_RADIO);

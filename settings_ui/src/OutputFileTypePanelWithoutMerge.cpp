@@ -8,11 +8,10 @@
 #include "PanelTheme.h"
 #include "SettingsKeys.h"
 
-// The second flag is part of every section's constructor; no section uses it.
 OutputFileTypePanelWithoutMerge::OutputFileTypePanelWithoutMerge(wxWindow* parent, bool enabled,
-                                                                 bool /*secondFlag*/)
+                                                                 bool secondFlag)
     : wxPanel(parent, wxID_ANY, wxDefaultPosition, wxDefaultSize, wxTAB_TRAVERSAL | wxNO_BORDER),
-      m_bOutputSectionEnabled(enabled)
+      m_bOutputSectionEnabled(enabled), m_bOutputSecondFlag(secondFlag)
 {
     // The views nest their controls in static boxes; validators must reach them.
     SetExtraStyle(GetExtraStyle() | wxWS_EX_VALIDATE_RECURSIVELY);

@@ -14,7 +14,7 @@
 PageSizePanelWithoutMerge::PageSizePanelWithoutMerge(wxWindow* parent, bool enabled,
                                                      bool secondFlag)
     : OutputFileTypePanelWithoutMerge(parent, enabled, secondFlag), m_bPageSectionEnabled(enabled),
-      m_strPageSize("Default Size"),
+      m_bPageSecondFlag(secondFlag), m_strPageSize("Default Size"),
       m_strImagePosition(TranslateUiText(SettingsDefaults::IMAGEPOSITION)),
       m_eMeasurementUnit(SettingsDefaults::CUSTOMPAGETUNIT)
 {
