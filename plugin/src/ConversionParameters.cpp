@@ -40,6 +40,8 @@ Unit_t UnitOfWord(const wxString& word)
 
 void EPS::LoadEPSParams()
 {
+    // Indexing adds the key with an empty value when it is absent, and the
+    // map is saved as it stands: kept so that saved preferences do not change.
     (void)m_settings["DEFAULTPAGESIZE"];
 
     if (IsOn(m_settings, "ORIGINALSIZE"))

@@ -1,13 +1,11 @@
 // The chosen page size, handed to the print server through Folder.cfg.
-#include <wx/filename.h>
-
 #include "EPS.h"
-#include "db/ConfigurationReader.h"
 #include "db/HFDatabase.h"
-#include "db/JobConfiguration.h"
 
 bool EPS::WriteJobOverrides(wxString folder)
 {
+    // Indexing adds the key with an empty value when it is absent, and the
+    // map is saved as it stands: kept so that saved preferences do not change.
     (void)m_settings["PAGESIZE_COMMAND"];
     if (m_lStatus != 0)
         return true;
@@ -27,20 +25,6 @@ bool EPS::WriteJobOverrides(wxString folder)
         {
             keys.Add("PageSize");
             values.Add(pageSize.Trim(true));
-        }
-    }
-
-    // The folder's own overrides are consulted for "RvUseAPPE"; what it says
-    // does not change what this filter writes.
-    const wxString configPath = wxFileName(folder, "Folder", "cfg").GetFullPath();
-    db::JobConfiguration jobConfiguration;
-    db::ConfigurationReader::ReadJobConfiguration(configPath, jobConfiguration);
-    for (const auto& entry : jobConfiguration.GetProperties())
-    {
-        if (entry.first.ToStdString() == "RvUseAPPE")
-        {
-            (void)entry.second.GetValue().IsSameAs("True", false);
-            break;
         }
     }
 
