@@ -20,8 +20,8 @@ template <typename Target> struct AttributeLink
 };
 
 // Applies the links to the element's attributes in table order and returns
-// how many were taken before the first missing key (the table's size when
-// none was missing). With duplicate attribute names the first counts.
+// the table position of the missing key that ended the chain (the table's
+// size when none did). With duplicate attribute names the first counts.
 template <typename Target, size_t N>
 size_t ReadAttributeChain(wxXmlNode* element, const AttributeLink<Target> (&links)[N],
                           Target& target)
