@@ -2,6 +2,7 @@
 
 #include <cwchar>
 
+#include "AttributeChain.h"
 #include "XmlHelper.h"
 
 namespace db
@@ -10,28 +11,94 @@ namespace folderfile
 {
 namespace
 {
-// Attribute values by position: the readers do not look at attribute names.
-wxString AttributeValueAt(const wxXmlNode* node, size_t index)
-{
-    const wxXmlAttribute* attribute = node->GetAttributes();
-    for (size_t i = 0; attribute && i < index; ++i)
-        attribute = attribute->GetNext();
-    return attribute ? attribute->GetValue() : wxString();
-}
-
-size_t AttributeCount(const wxXmlNode* node)
-{
-    return CXmlPropertyHelper::Count(node->GetAttributes());
-}
-
 long long ParseLong(const wxString& text)
 {
     return std::wcstoll(text.wc_str(), nullptr, 10);
 }
 
-bool IsOne(const wxString& text)
+// Numbers stored by "%d": on when not zero.
+template <auto Set>
+void AsNonZero(typename SetterClass<decltype(Set)>::Type& target, const wxString& text)
 {
-    return text == "1";
+    (target.*Set)(ParseLong(text) != 0);
+}
+
+// The root attributes in reading order (not the writing order). The first
+// four are mandatory; from "Enable" on, a missing key ends the reading, except
+// "server_version", which older writers did not always store.
+const AttributeLink<Setting> kSettingAttributes[] = {
+    {"name", &AsText<&Setting::SetName>},
+    {"description", &AsText<&Setting::SetDescription>},
+    {"server_ip", &AsText<&Setting::SetServerIP>},
+    {"server_name", &AsText<&Setting::SetServerName>},
+    {"Enable", &AsOneFlag<&Setting::SetStatusEnable>},
+    {"BaseVirtualPrinter", &AsText<&Setting::SetBaseVirtualPrinter>},
+    {"BaseVirtualPrinterName", &AsText<&Setting::SetBaseVirtualPrinterName>},
+    {"BaseVirtualPrinterDisplayName", &AsText<&Setting::SetBaseVirtualPrinterDisplayName>},
+    {"HFPresetName", &AsText<&Setting::SetSelectedPreset>},
+    {"Centralized", &AsOneFlag<&Setting::SetStatusCentralized>},
+    {"Isjobpresetattached", &AsOneFlag<&Setting::SetJobPresetAttched>},
+    {"IsCustomInterval", &AsOneFlag<&Setting::SetCustomInterval>},
+    {"TimeInterval", &AsText<&Setting::SetCustomTimeInterval>},
+    {"PPDVersion", &AsText<&Setting::SetPPDVersion>},
+    {"ServerTypeAndJPDefaultKeyInfo", &AsText<&Setting::SetServerTypeAndJPDefaultKeyInfo>},
+    {"server_version",
+     [](Setting& setting, const wxString& text) { setting.SetServerVersion(ParseLong(text)); },
+     true},
+    {"server_textversion", &AsText<&Setting::SetTextServerVersion>},
+    {"server_type", &AsText<&Setting::SetServerType>},
+    {"Quickset", &AsText<&Setting::SetSelectedQuickSet>},
+    {"Quickset_Supported", &AsNonZero<&Setting::SetQuickSetsSupported>},
+    {"Quickset_Enabled", &AsNonZero<&Setting::EnableQuickSets>},
+    {"IsWidthBased", &AsNonZero<&Setting::SetIsWidthBased>},
+    {"JobExpert_Supported", &AsNonZero<&Setting::SetJobExpertSupported>},
+    {"JobExpert", &AsNonZero<&Setting::EnableJobExpert>},
+    {"JobExpertRule",
+     [](Setting& setting, const wxString& text) {
+         setting.SetJobExpertRule({text, setting.GetJobExpertRule().second});
+     }},
+    {"JobExpertRuleDisplayValue",
+     [](Setting& setting, const wxString& text) {
+         setting.SetJobExpertRule({setting.GetJobExpertRule().first, text});
+     }},
+};
+const size_t kMandatorySettingAttributes = 4;
+
+wxString ValueAt(wxXmlAttribute* attributes, size_t index)
+{
+    return CXmlPropertyHelper::ValueAt(attributes, index);
+}
+
+// Hands the attribute list of every child of the named block that has at
+// least two attributes to take, in document order: the entries of a block
+// are read by attribute position, not by name. False when there is no block.
+template <typename Take> bool ReadEntries(wxXmlNode* root, const char* blockName, Take take)
+{
+    wxXmlNode* block = CXmlNodeHelper::Find(root, blockName, true);
+    if (!block)
+        return false;
+    for (wxXmlNode* child = block->GetChildren(); child; child = child->GetNext())
+        if (CXmlPropertyHelper::Count(child->GetAttributes()) >= 2)
+            take(child->GetAttributes());
+    return true;
+}
+
+// A block of setting name to texts: the key is the first attribute, the
+// texts are the attributes at the given positions ("" where a child has
+// fewer). The first entry of a key wins; the block replaces the whole map.
+template <typename Configuration, typename... Position>
+void ReadKeyed(wxXmlNode* root, const char* blockName, Configuration& configuration,
+               Position... positions)
+{
+    typename Configuration::Map entries;
+    if (ReadEntries(root, blockName,
+                    [&entries, positions...](wxXmlAttribute* attributes)
+                    {
+                        entries.emplace(
+                            ValueAt(attributes, 0),
+                            typename Configuration::PairString(ValueAt(attributes, positions)...));
+                    }))
+        configuration.SetProperties(entries);
 }
 } // namespace
 
@@ -47,104 +114,9 @@ int ReadSettings(wxXmlNode* root, Setting& setting)
 {
     if (!root->GetAttributes())
         return -1;
-    WxStrAttributeMap attributes;
-    CXmlNodeHelper::Read(root, attributes);
-    auto text = [&attributes](const char* key, wxString& value)
-    {
-        const auto found = attributes.find(key);
-        if (found == attributes.end())
-            return false;
-        value = found->second;
-        return true;
-    };
-
-    int result = -1;
-    wxString value;
-    do
-    {
-        if (!text("name", value))
-            break;
-        setting.SetName(value);
-        if (!text("description", value))
-            break;
-        setting.SetDescription(value);
-        if (!text("server_ip", value))
-            break;
-        setting.SetServerIP(value);
-        if (!text("server_name", value))
-            break;
-        setting.SetServerName(value);
-        result = 1;
-
-        // A chain: an older file lacks the later keys, and the first missing
-        // one ends the reading ("server_version" alone may be absent).
-        if (!text("Enable", value))
-            break;
-        setting.SetStatusEnable(IsOne(value));
-        if (!text("BaseVirtualPrinter", value))
-            break;
-        setting.SetBaseVirtualPrinter(value);
-        if (!text("BaseVirtualPrinterName", value))
-            break;
-        setting.SetBaseVirtualPrinterName(value);
-        if (!text("BaseVirtualPrinterDisplayName", value))
-            break;
-        setting.SetBaseVirtualPrinterDisplayName(value);
-        if (!text("HFPresetName", value))
-            break;
-        setting.SetSelectedPreset(value);
-        if (!text("Centralized", value))
-            break;
-        setting.SetStatusCentralized(IsOne(value));
-        if (!text("Isjobpresetattached", value))
-            break;
-        setting.SetJobPresetAttched(IsOne(value));
-        if (!text("IsCustomInterval", value))
-            break;
-        setting.SetCustomInterval(IsOne(value));
-        if (!text("TimeInterval", value))
-            break;
-        setting.SetCustomTimeInterval(value);
-        if (!text("PPDVersion", value))
-            break;
-        setting.SetPPDVersion(value);
-        if (!text("ServerTypeAndJPDefaultKeyInfo", value))
-            break;
-        setting.SetServerTypeAndJPDefaultKeyInfo(value);
-        if (text("server_version", value))
-            setting.SetServerVersion(ParseLong(value));
-        if (!text("server_textversion", value))
-            break;
-        setting.SetTextServerVersion(value);
-        if (!text("server_type", value))
-            break;
-        setting.SetServerType(value);
-        if (!text("Quickset", value))
-            break;
-        setting.SetSelectedQuickSet(value);
-        if (!text("Quickset_Supported", value))
-            break;
-        setting.SetQuickSetsSupported(ParseLong(value) != 0);
-        if (!text("Quickset_Enabled", value))
-            break;
-        setting.EnableQuickSets(ParseLong(value) != 0);
-        if (!text("IsWidthBased", value))
-            break;
-        setting.SetIsWidthBased(ParseLong(value) != 0);
-        if (!text("JobExpert_Supported", value))
-            break;
-        setting.SetJobExpertSupported(ParseLong(value) != 0);
-        if (!text("JobExpert", value))
-            break;
-        setting.EnableJobExpert(ParseLong(value) != 0);
-        std::pair<wxString, wxString> rule = setting.GetJobExpertRule();
-        if (!text("JobExpertRule", rule.first))
-            break;
-        setting.SetJobExpertRule(rule);
-        if (!text("JobExpertRuleDisplayValue", rule.second))
-            break;
-        setting.SetJobExpertRule(rule);
-    } while (false);
+    const int result =
+        ReadAttributeChain(root, kSettingAttributes, setting) >= kMandatorySettingAttributes ? 1
+                                                                                             : -1;
 
     if (wxXmlNode* summary = CXmlNodeHelper::Find(root, "InputFormatsSummary", true))
     {
@@ -186,49 +158,23 @@ void ReadFilter(wxXmlNode* root, FilterConfiguration& configuration)
 
 void ReadJob(wxXmlNode* root, JobConfiguration& configuration)
 {
-    wxXmlNode* block = CXmlNodeHelper::Find(root, "JobSetting", true);
-    if (!block)
-        return;
-    JobConfiguration::Map entries;
-    for (const wxXmlNode* child = block->GetChildren(); child; child = child->GetNext())
-    {
-        if (AttributeCount(child) < 2)
-            continue;
-        entries.emplace(AttributeValueAt(child, 0),
-                        JobConfiguration::PairString(AttributeValueAt(child, 1),
-                                                     AttributeValueAt(child, 2),
-                                                     AttributeValueAt(child, 3)));
-    }
-    configuration.SetProperties(entries);
+    // Key, value, display value, localised display value.
+    ReadKeyed(root, "JobSetting", configuration, 1, 2, 3);
 }
 
 void ReadImpose(wxXmlNode* root, ImposeConfiguration& configuration)
 {
-    wxXmlNode* block = CXmlNodeHelper::Find(root, "ImposeSetting", true);
-    if (!block)
-        return;
-    ImposeConfiguration::Map entries;
-    for (const wxXmlNode* child = block->GetChildren(); child; child = child->GetNext())
-    {
-        if (AttributeCount(child) < 2)
-            continue;
-        entries.emplace(AttributeValueAt(child, 0),
-                        ImposeConfiguration::PairString(AttributeValueAt(child, 1),
-                                                        AttributeValueAt(child, 2)));
-    }
-    configuration.SetProperties(entries);
+    // Key, value, display value.
+    ReadKeyed(root, "ImposeSetting", configuration, 1, 2);
 }
 
 void ReadPreflight(wxXmlNode* root, PreflightConfiguration& configuration)
 {
-    wxXmlNode* block = CXmlNodeHelper::Find(root, "PreflightSettings", true);
-    if (!block)
-        return;
     PreflightConfiguration::List entries;
-    for (const wxXmlNode* child = block->GetChildren(); child; child = child->GetNext())
-        if (AttributeCount(child) >= 2)
-            entries.emplace_back(AttributeValueAt(child, 0), AttributeValueAt(child, 1));
-    configuration.SetProperties(entries);
+    if (ReadEntries(root, "PreflightSettings",
+                    [&entries](wxXmlAttribute* attributes)
+                    { entries.emplace_back(ValueAt(attributes, 0), ValueAt(attributes, 1)); }))
+        configuration.SetProperties(entries);
 }
 } // namespace folderfile
 } // namespace db

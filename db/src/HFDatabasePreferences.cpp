@@ -4,6 +4,7 @@
 
 #include <wx/filename.h>
 
+#include "AttributeChain.h"
 #include "SharedDirectory.h"
 #include "XmlHelper.h"
 #include "db/AtomicFile.h"
@@ -36,6 +37,25 @@ wxString UnitFromStoredText(const wxString& stored)
         return translations->Translate("point");
     return translations->Translate("inch");
 }
+
+// The attributes in reading order. A file from an older version with fewer
+// keys loads its leading part: the first missing key ends the reading.
+const AttributeLink<Preference> kPreferenceAttributes[] = {
+    {"AppLanguage", &AsText<&Preference::SetAppLang>},
+    {"Units", [](Preference& preference, const wxString& text)
+     { preference.SetUnit(UnitFromStoredText(text)); }},
+    {"UserChangedUnit", &AsText<&Preference::SetUserUnitChanged>},
+    {"ImposePresetLocation", &AsText<&Preference::SetImpositionPresetLocation>},
+    {"TimeInterval", &AsText<&Preference::SetTimeInterval>},
+    {"IsCustomLocation", &AsOneFlag<&Preference::SetStatusCustomLocation>},
+    {"SaveLocation", &AsText<&Preference::SetJobsSaveLocation>},
+    {"IsClearOriginalJobs", &AsOneFlag<&Preference::SetStatusClearOriginal>},
+    {"ClearOriginalJobsValue", &AsText<&Preference::SetOroginalJobClearValue>},
+    {"IsClearFailedJobs", &AsOneFlag<&Preference::SetStatusClearFailed>},
+    {"ClearFailedJobsValue", &AsText<&Preference::SetFailedJobClearValue>},
+    {"IsAutoRefreshPreset", &AsOneFlag<&Preference::SetStatusAutoRefresh>},
+    {"AutoRefreshPresetValue", &AsText<&Preference::SetAutoRefreshPresetValue>},
+};
 } // namespace
 
 int HFDatabase::ReadPreferences(Preference& preference)
@@ -47,62 +67,9 @@ int HFDatabase::ReadPreferences(Preference& preference)
         CXmlDocumentHelper::Load(ToStdStr(path), L"UTF-8"));
     if (!document || !document->GetRoot())
         return -1;
-    WxStrAttributeMap attributes;
-    CXmlNodeHelper::Read(document->GetRoot(), attributes);
-    auto text = [&attributes](const char* key, wxString& value)
-    {
-        const auto found = attributes.find(key);
-        if (found == attributes.end())
-            return false;
-        value = found->second;
-        return true;
-    };
-
-    // A file from an older version with fewer keys loads its leading part:
-    // the first missing key ends the reading.
-    wxString value;
-    do
-    {
-        if (!text("AppLanguage", value))
-            break;
-        preference.SetAppLang(value);
-        if (!text("Units", value))
-            break;
-        preference.SetUnit(UnitFromStoredText(value));
-        if (!text("UserChangedUnit", value))
-            break;
-        preference.SetUserUnitChanged(value);
-        if (!text("ImposePresetLocation", value))
-            break;
-        preference.SetImpositionPresetLocation(value);
-        if (!text("TimeInterval", value))
-            break;
-        preference.SetTimeInterval(value);
-        if (!text("IsCustomLocation", value))
-            break;
-        preference.SetStatusCustomLocation(value == "1");
-        if (!text("SaveLocation", value))
-            break;
-        preference.SetJobsSaveLocation(value);
-        if (!text("IsClearOriginalJobs", value))
-            break;
-        preference.SetStatusClearOriginal(value == "1");
-        if (!text("ClearOriginalJobsValue", value))
-            break;
-        preference.SetOroginalJobClearValue(value);
-        if (!text("IsClearFailedJobs", value))
-            break;
-        preference.SetStatusClearFailed(value == "1");
-        if (!text("ClearFailedJobsValue", value))
-            break;
-        preference.SetFailedJobClearValue(value);
-        if (!text("IsAutoRefreshPreset", value))
-            break;
-        preference.SetStatusAutoRefresh(value == "1");
-        if (!text("AutoRefreshPresetValue", value))
-            break;
-        preference.SetAutoRefreshPresetValue(value);
-    } while (false);
+    ReadAttributeChain(document->GetRoot(), kPreferenceAttributes, preference);
+    // -1 whenever the file exists, however much of it was read: callers
+    // tell only "found" from "not found".
     return -1;
 }
 

@@ -137,8 +137,6 @@ wxString PathResolver::GetDefaultFailFolderPath(const wxString& hotFolder)
 wxString PathResolver::GetTempLocationForWorkFolder(const wxString& hotFolder)
 {
     const wxString file = GetContainerFolder_SettingFilePath(hotFolder);
-    Setting setting;
-    HFDatabase::ReadSetting(file, setting);
     FolderConfiguration folders;
     ConfigurationReader::ReadFolderConfiguration(file, folders);
     wxFileName name = wxFileName::DirName(folders.GetWorkFolder());

@@ -186,7 +186,7 @@ bool PrepareInit(const InitRequest& request, InitPlan& plan)
         return false;
     }
     const wxString modulePath = LocateFilterModule(FromUtf8(request.module));
-    plan.filter.reset(MakeDefaultFilterNode(modulePath, error, &plan.info));
+    plan.filter = MakeDefaultFilterNode(modulePath, error, &plan.info);
     if (!plan.filter)
     {
         PrintError(error);

@@ -17,7 +17,6 @@ void ProgressDisplay::BeginJob(size_t index, size_t total, const wxString& name)
 
 void ProgressDisplay::ReportProgress(const wxString&, int percent)
 {
-    ++m_reports;
     m_percent = std::clamp(percent, 0, 100);
     if (m_terminal)
         Draw();

@@ -17,8 +17,6 @@ public:
     // A line that must not be torn by the bar.
     void Note(const wxString& line);
 
-    int ReportsSeen() const { return m_reports; }
-
 private:
     void Draw();
     void ClearBar();
@@ -28,6 +26,5 @@ private:
     size_t m_index = 0;
     size_t m_total = 0;
     int m_percent = 0;
-    int m_reports = 0;
     wxString m_name;
 };

@@ -64,7 +64,8 @@ void FilterSession::ClearStatusAfterFailure()
         m_plugin->Initialize(m_serverDescription);
 }
 
-wxXmlNode* MakeDefaultFilterNode(const wxString& modulePath, wxString& error, PluginInfo* described)
+std::unique_ptr<wxXmlNode> MakeDefaultFilterNode(const wxString& modulePath, wxString& error,
+                                                 PluginInfo* described)
 {
     std::unique_ptr<FilterModule> module = FilterModule::Open(modulePath, error);
     if (!module)
@@ -81,11 +82,10 @@ wxXmlNode* MakeDefaultFilterNode(const wxString& modulePath, wxString& error, Pl
     }
     // A fresh object, not initialised from anything: what it saves are the
     // filter's own defaults.
-    auto* filter = new wxXmlNode(wxXML_ELEMENT_NODE, "Filter");
+    auto filter = std::make_unique<wxXmlNode>(wxXML_ELEMENT_NODE, "Filter");
     filter->AddAttribute("name", info.m_strIdentifier);
-    if (plugin->SavePreference(filter) != 0)
+    if (plugin->SavePreference(filter.get()) != 0)
     {
-        delete filter;
         error = "the filter could not save its default settings";
         return nullptr;
     }

@@ -40,5 +40,5 @@ private:
 // A "Filter" element named by the filter's identifier holding what a freshly
 // made filter object saves: the filter's defaults. Null with a reason on failure.
 // described, when given, receives the module's description.
-wxXmlNode* MakeDefaultFilterNode(const wxString& modulePath, wxString& error,
-                                 PluginInfo* described = nullptr);
+std::unique_ptr<wxXmlNode> MakeDefaultFilterNode(const wxString& modulePath, wxString& error,
+                                                 PluginInfo* described = nullptr);

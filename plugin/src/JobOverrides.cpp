@@ -34,8 +34,8 @@ bool EPS::WriteJobOverrides(wxString folder)
         }
     }
 
-    // The folder's own overrides are consulted for "RvUseAPPE"; what it says
-    // does not change what this filter writes.
+    // The folder's own overrides are consulted for "RvUseAPPE", as the filter
+    // always has; what it says does not change what this filter writes.
     const wxString configPath = wxFileName(folder, "Folder", "cfg").GetFullPath();
     db::JobConfiguration jobConfiguration;
     db::ConfigurationReader::ReadJobConfiguration(configPath, jobConfiguration);

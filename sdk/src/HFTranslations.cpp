@@ -106,7 +106,7 @@ const wxString* Lookup(const wxTranslations& translations, const wxString& engli
 }
 } // namespace
 
-HFTranslations::HFTranslations() : m_pImpl(new Impl)
+HFTranslations::HFTranslations() : m_pImpl(std::make_unique<Impl>())
 {
     m_pImpl->directory = FindCatalogDirectory();
     const DirectoryLoader loader(m_pImpl->directory);
@@ -118,6 +118,8 @@ HFTranslations::HFTranslations() : m_pImpl(new Impl)
             m_pImpl->catalogs[language] = std::move(translations);
     }
 }
+
+HFTranslations::~HFTranslations() = default;
 
 HFTranslations* HFTranslations::GetInstance()
 {

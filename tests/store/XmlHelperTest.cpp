@@ -175,7 +175,7 @@ TEST(XmlNodeHelper, RemoveChildrenLeavesNodeEmptyAndUsable)
     EXPECT_NE(CXmlNodeHelper::Find(doc->GetRoot(), "d"), nullptr);
 }
 
-TEST(XmlPropertyHelper, CountAndExactFind)
+TEST(XmlPropertyHelper, CountExactFindAndValueByPosition)
 {
     auto doc = Parse("<n a='1' Name='2' name='3'/>");
     wxXmlAttribute* first = doc->GetRoot()->GetAttributes();
@@ -185,6 +185,10 @@ TEST(XmlPropertyHelper, CountAndExactFind)
     ASSERT_NE(found, nullptr);
     EXPECT_EQ(found->GetValue(), "3");
     EXPECT_EQ(CXmlPropertyHelper::Find(first, L"nam"), nullptr);
+    // Positions past the end, and an empty list, read as "".
+    EXPECT_EQ(CXmlPropertyHelper::ValueAt(first, 1), "2");
+    EXPECT_EQ(CXmlPropertyHelper::ValueAt(first, 3), "");
+    EXPECT_EQ(CXmlPropertyHelper::ValueAt(nullptr, 0), "");
 }
 
 TEST(StdString, NarrowTextIsWidenedThroughTheLocale)

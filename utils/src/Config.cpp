@@ -13,23 +13,6 @@
 
 namespace
 {
-// Attribute values in document order; names are not looked at.
-wxString AttributeValue(const wxXmlNode* node, int index)
-{
-    const wxXmlAttribute* attribute = node->GetAttributes();
-    for (int i = 0; attribute && i < index; ++i)
-        attribute = attribute->GetNext();
-    return attribute ? attribute->GetValue() : wxString();
-}
-
-int AttributeCount(const wxXmlNode* node)
-{
-    int count = 0;
-    for (const wxXmlAttribute* a = node->GetAttributes(); a; a = a->GetNext())
-        ++count;
-    return count;
-}
-
 wxString ExecutablePath()
 {
     const std::string program = posix::ExecutablePath();
@@ -78,9 +61,11 @@ bool Config::Initialize()
     {
         for (wxXmlNode* child = entries->GetChildren(); child; child = child->GetNext())
         {
-            if (child->GetType() != wxXML_ELEMENT_NODE || AttributeCount(child) < 2)
+            if (child->GetType() != wxXML_ELEMENT_NODE ||
+                CXmlPropertyHelper::Count(child->GetAttributes()) < 2)
                 continue;
-            AddKey(AttributeValue(child, 0), AttributeValue(child, 1));
+            AddKey(CXmlPropertyHelper::ValueAt(child->GetAttributes(), 0),
+                   CXmlPropertyHelper::ValueAt(child->GetAttributes(), 1));
         }
     }
 
@@ -92,11 +77,12 @@ bool Config::Initialize()
         {
             if (child->GetType() != wxXML_ELEMENT_NODE)
                 continue;
-            const int count = AttributeCount(child);
+            wxXmlAttribute* attributes = child->GetAttributes();
+            const size_t count = CXmlPropertyHelper::Count(attributes);
             if (count >= 1)
-                m_displayKeys.push_back(AttributeValue(child, 0));
+                m_displayKeys.push_back(CXmlPropertyHelper::ValueAt(attributes, 0));
             if (count >= 2)
-                m_displayNames.push_back(AttributeValue(child, 1));
+                m_displayNames.push_back(CXmlPropertyHelper::ValueAt(attributes, 1));
         }
     }
     return true;

@@ -62,6 +62,11 @@ public:
 
     // First attribute of the list named exactly name, or null.
     static wxXmlAttribute* Find(wxXmlAttribute* first, const CStdStr<wchar_t>& name);
+
+    // Value of the index-th attribute of the list (from 0), or "" when the
+    // list is shorter. For files whose entries are read by position, not by
+    // attribute name.
+    static wxString ValueAt(wxXmlAttribute* first, size_t index);
 };
 
 class CXmlDocumentHelper

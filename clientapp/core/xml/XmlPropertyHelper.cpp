@@ -16,3 +16,11 @@ wxXmlAttribute* CXmlPropertyHelper::Find(wxXmlAttribute* first, const CStdStr<wc
             return attribute;
     return nullptr;
 }
+
+wxString CXmlPropertyHelper::ValueAt(wxXmlAttribute* first, size_t index)
+{
+    wxXmlAttribute* attribute = first;
+    for (size_t i = 0; attribute && i < index; ++i)
+        attribute = attribute->GetNext();
+    return attribute ? attribute->GetValue() : wxString();
+}

@@ -1,46 +1,15 @@
 #pragma once
-#include <map>
-
-#include <wx/string.h>
+#include "db/KeyedConfiguration.h"
 
 namespace db
 {
 // Imposition settings: setting name to (display value, value), ordered by name.
-class ImposeConfiguration
+class ImposeConfiguration : public KeyedConfiguration<SettingTexts>
 {
 public:
-    class PairString
-    {
-    public:
-        PairString() = default;
-        PairString(const wxString& value, const wxString& displayValue)
-            : m_strDisplayValue(displayValue), m_strValue(value)
-        {
-        }
-        const wxString& GetDisplayValue() const { return m_strDisplayValue; }
-        const wxString& GetValue() const { return m_strValue; }
-        bool operator==(const PairString& other) const
-        {
-            return m_strDisplayValue == other.m_strDisplayValue && m_strValue == other.m_strValue;
-        }
-
-    private:
-        wxString m_strDisplayValue;
-        wxString m_strValue;
-    };
-    using Map = std::map<wxString, PairString>;
-
+    // Replaces the texts of an existing key or adds the key.
     void SaveProperty(const wxString& key, const wxString& value, const wxString& displayValue);
+    // False (outputs untouched) when the key is absent.
     bool GetProperty(const wxString& key, wxString& value, wxString& displayValue) const;
-    void RemoveProperty(const wxString& key);
-    void RemoveAll();
-    void GetProperties(Map& properties) const;
-    void SetProperties(const Map& properties);
-    const Map& GetProperties() const { return m_Properties; }
-
-    void WriteToString(wxString& out) const;
-
-private:
-    Map m_Properties;
 };
 } // namespace db

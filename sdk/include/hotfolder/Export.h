@@ -1,7 +1,4 @@
 #pragma once
-// Symbols of the default host services library. Everything else is hidden.
-#if defined(HF_SDK_BUILDING)
+// Symbols of the default host services library, the same for the library
+// and its users. Everything else is hidden.
 #define HF_SDK_API __attribute__((visibility("default")))
-#else
-#define HF_SDK_API __attribute__((visibility("default")))
-#endif

@@ -1,4 +1,6 @@
 #pragma once
+#include <memory>
+
 #include <wx/arrstr.h>
 #include <wx/string.h>
 #include "hotfolder/Export.h"
@@ -29,8 +31,12 @@ public:
     // Where the catalogues are read from.
     wxString CatalogDirectory() const;
 
+    HFTranslations(const HFTranslations&) = delete;
+    HFTranslations& operator=(const HFTranslations&) = delete;
+    ~HFTranslations();
+
 private:
     HFTranslations();
     struct Impl;
-    Impl* m_pImpl;
+    std::unique_ptr<Impl> m_pImpl;
 };
