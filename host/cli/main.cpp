@@ -8,6 +8,7 @@
 
 #include "cli/Commands.h"
 #include "cli/ConsoleText.h"
+#include "service/ServiceCommands.h"
 #ifdef HF_WITH_PRINTING
 #include "ServerFromPpdCommand.h"
 #endif
@@ -23,6 +24,10 @@ static const char kUsage[] =
     "  convert   put one file through the filter\n"
     "  server-from-ppd\n"
     "            write the server description of a printer from its PPD file\n"
+    "  serve     serve every listed hot folder (the hot-folder service)\n"
+    "  stop      ask the hot-folder service to end\n"
+    "  status    tell what the hot-folder service and each listed folder are doing\n"
+    "  remove    take a folder off the hot-folder list\n"
     "\n"
     "'hotfolder <command> --help' describes each command.\n"
     "Every command takes --module PATH to name the filter module; otherwise\n"
@@ -57,6 +62,15 @@ int main(int argc, char** argv)
         return RunRunCommand(args);
     if (command == "convert")
         return RunConvertCommand(args);
+    // The hot-folder service.
+    if (command == "serve")
+        return RunServeCommand(args);
+    if (command == "stop")
+        return RunStopCommand(args);
+    if (command == "status")
+        return RunStatusCommand(args);
+    if (command == "remove")
+        return RunRemoveCommand(args);
     if (command == "server-from-ppd")
     {
 #ifdef HF_WITH_PRINTING
