@@ -15,6 +15,7 @@
 #include "cli/ExitStatus.h"
 #include "db/PathResolver.h"
 #include "folder/FileMoves.h"
+#include "folder/HotFolder.h"
 #include "jobs/RunStatistics.h"
 #include "jobs/StopRequest.h"
 #include "service/HotFolderListEntries.h"
@@ -60,6 +61,8 @@ private:
     {
         std::unique_ptr<ServedFolder> folder;
         int watch = -1;
+        int configWatch = -1; // the container: Folder.cfg and the server description
+        bool reload = false;
         wxString problem; // why it is not served; empty while it is
     };
 
@@ -81,6 +84,7 @@ private:
     bool m_listChanged = true;
     std::map<wxString, Entry> m_entries;
     std::map<int, wxString> m_byWatch;
+    std::map<int, wxString> m_byConfigWatch;
     Clock::time_point m_nextRetry;
     RunStatistics m_ended; // counts of folders no longer served
     double m_busySeconds = 0;
@@ -102,6 +106,12 @@ void Service::Drop(Entry& entry, const wxString& problem)
         m_byWatch.erase(entry.watch);
         inotify_rm_watch(m_inotify, entry.watch);
         entry.watch = -1;
+    }
+    if (entry.configWatch >= 0)
+    {
+        m_byConfigWatch.erase(entry.configWatch);
+        inotify_rm_watch(m_inotify, entry.configWatch);
+        entry.configWatch = -1;
     }
     entry.problem = problem;
 }
@@ -125,6 +135,12 @@ void Service::Serve(const wxString& path, Entry& entry)
         entry.folder = ServedFolder::Open(path, m_options.modulePath, m_options.settle, problem);
         if (entry.folder)
         {
+            // Settings changed while serving apply from the next job on.
+            entry.configWatch = inotify_add_watch(
+                m_inotify, db::PathResolver::GetContainerFolderPath(path).fn_str(),
+                IN_CLOSE_WRITE | IN_MOVED_TO | IN_ONLYDIR);
+            if (entry.configWatch >= 0)
+                m_byConfigWatch[entry.configWatch] = path;
             entry.problem.clear();
             ServiceLog(Severity::Info, "serving " + path);
             return;
@@ -157,6 +173,12 @@ void Service::SyncList()
     for (const wxString& path : listed)
     {
         Entry& entry = m_entries[path];
+        if (entry.reload)
+        {
+            ServiceLog(Severity::Info, "the settings of " + path + " changed; reading them again");
+            Drop(entry, wxString());
+            entry.reload = false;
+        }
         if (!entry.folder)
             Serve(path, entry);
     }
@@ -194,6 +216,13 @@ void Service::DrainEvents()
             {
                 if ((event->mask & (IN_DELETE_SELF | IN_MOVE_SELF)) || name == kMarkerName)
                     m_stop = true;
+                continue;
+            }
+            auto configured = m_byConfigWatch.find(event->wd);
+            if (configured != m_byConfigWatch.end())
+            {
+                if (name == "Folder.cfg" || name == HotFolder::kServerDescriptionName)
+                    m_entries[configured->second].reload = true;
                 continue;
             }
             auto watched = m_byWatch.find(event->wd);
@@ -286,7 +315,10 @@ int Service::Run()
     while (!StopWanted())
     {
         const auto started = Clock::now();
-        if (m_listChanged || started >= m_nextRetry)
+        bool reload = false;
+        for (const auto& served : m_entries)
+            reload = reload || served.second.reload;
+        if (m_listChanged || reload || started >= m_nextRetry)
             SyncList();
         const bool stopMarkerPresent = Exists(stopMarker);
         if (stopMarkerPresent != paused)
@@ -305,8 +337,12 @@ int Service::Run()
             if (started >= nextRescan)
             {
                 for (auto& served : m_entries)
-                    if (served.second.folder)
-                        served.second.folder->Rescan();
+                    if (served.second.folder && !served.second.folder->Rescan())
+                    {
+                        ServiceLog(Severity::Error,
+                                   served.first + " vanished; it is no longer served");
+                        Drop(served.second, "the folder vanished");
+                    }
                 nextRescan = started + std::chrono::milliseconds(tickMs);
             }
             // Each folder in turn, a batch at a time, events read in between

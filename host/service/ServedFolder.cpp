@@ -62,11 +62,15 @@ void ServedFolder::OfferAll()
         m_offered.insert(wxFileName(path).GetFullName());
 }
 
-void ServedFolder::Rescan()
+bool ServedFolder::Rescan()
 {
+    struct stat info;
+    if (stat(Path().fn_str(), &info) != 0 || !S_ISDIR(info.st_mode))
+        return false;
     for (const wxString& path : m_settle.Settled(ListFolderFiles(Path())))
         if (!IsSetAside(path))
             m_offered.insert(wxFileName(path).GetFullName());
+    return true;
 }
 
 bool ServedFolder::IsSetAside(const wxString& path) const

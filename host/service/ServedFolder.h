@@ -37,7 +37,8 @@ public:
     // Every visible file of the folder, as after an overflow of events.
     void OfferAll();
     // Looks for files changed without events; settled ones are offered.
-    void Rescan();
+    // False when the folder itself is gone.
+    bool Rescan();
     bool HasOffers() const { return !m_offered.empty(); }
 
     // Takes up to limit offered files through the filter; stop is asked

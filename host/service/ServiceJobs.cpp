@@ -6,6 +6,7 @@
 #include <cstring>
 #include <dirent.h>
 #include <fcntl.h>
+#include <signal.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -339,6 +340,14 @@ void ServiceJobs::LogFailure(const wxString& name, const wxString& reason)
 
 void ServiceJobs::Recover()
 {
+    // Probes of the output folder left by a killed process.
+    for (const wxString& entry : EntryNames(m_places.outputFolder))
+    {
+        long pid = 0;
+        if (entry.StartsWith(".hotfolder-probe-") && entry.Mid(17).ToLong(&pid) && pid > 0 &&
+            kill(static_cast<pid_t>(pid), 0) != 0 && errno == ESRCH)
+            unlink(Native(wxFileName(m_places.outputFolder, entry).GetFullPath()).c_str());
+    }
     bool inHand = false;
     for (const wxString& entry : EntryNames(m_places.workFolder))
     {
