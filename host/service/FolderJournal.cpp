@@ -60,14 +60,17 @@ wxString FolderJournal::DeliveryOf(const wxString& job) const
     return it == m_deliveries.end() ? wxString() : it->second;
 }
 
-bool FolderJournal::RecordDelivery(const wxString& job, const wxString& outputName)
+bool FolderJournal::RecordDeliveries(const std::vector<std::pair<wxString, wxString>>& records)
 {
-    const std::string line = "deliver\t" + ToUtf8(job) + "\t" + ToUtf8(outputName) + "\n";
-    if (write(m_fd, line.data(), line.size()) != static_cast<ssize_t>(line.size()) ||
+    std::string lines;
+    for (const auto& record : records)
+        lines += "deliver\t" + ToUtf8(record.first) + "\t" + ToUtf8(record.second) + "\n";
+    if (write(m_fd, lines.data(), lines.size()) != static_cast<ssize_t>(lines.size()) ||
         fdatasync(m_fd) != 0)
         return false;
-    m_deliveries[job] = outputName;
-    ++m_records;
+    for (const auto& record : records)
+        m_deliveries[record.first] = record.second;
+    m_records += records.size();
     return true;
 }
 

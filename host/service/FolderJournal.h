@@ -1,5 +1,7 @@
 #pragma once
 #include <map>
+#include <utility>
+#include <vector>
 
 #include <wx/string.h>
 
@@ -27,8 +29,9 @@ public:
 
     // The output name last recorded for a job; empty when none.
     wxString DeliveryOf(const wxString& job) const;
-    // Appends the record and syncs it; false when it is not on disk.
-    bool RecordDelivery(const wxString& job, const wxString& outputName);
+    // Appends (job, output name) records and syncs them; false when they are
+    // not on disk.
+    bool RecordDeliveries(const std::vector<std::pair<wxString, wxString>>& records);
     // Drops every record; only when no job is in hand.
     void Clear();
     bool Large() const { return m_records > 256; }

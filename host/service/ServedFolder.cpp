@@ -153,5 +153,6 @@ size_t ServedFolder::TakeOffered(size_t limit, const std::function<bool()>& stop
             for (const wxString& file : jobs[i].files)
                 SetAside(file);
     }
+    m_jobs->Commit();
     return run;
 }

@@ -99,7 +99,6 @@ bool Stage(const wxString& from, const wxString& to, bool copy, wxString& error)
 {
     if (!copy)
     {
-        SyncPath(from);
         if (rename(Native(from).c_str(), Native(to).c_str()) == 0)
             return true;
         if (errno != EXDEV)
@@ -110,7 +109,7 @@ bool Stage(const wxString& from, const wxString& to, bool copy, wxString& error)
     }
     const wxString temporary = to + ".tmp";
     unlink(Native(temporary).c_str());
-    if (!CopyFileTo(from, temporary, error, true))
+    if (!CopyFileTo(from, temporary, error)) // synced with the batch
         return false;
     if (rename(Native(temporary).c_str(), Native(to).c_str()) != 0)
     {
@@ -132,7 +131,7 @@ wxString ServiceJobs::OriginalsDirectory(const wxString& id) const
     return wxFileName(WorkDirectory(id), kOriginals).GetFullPath();
 }
 
-wxString ServiceJobs::Staged(const wxString& id, const char* what) const
+wxString ServiceJobs::StagedPath(const wxString& id, const char* what) const
 {
     return wxFileName(m_places.outputFolder, ".hf-" + id + "." + what).GetFullPath();
 }
@@ -149,7 +148,7 @@ std::vector<wxString> ServiceJobs::Originals(const wxString& id) const
 void ServiceJobs::RemoveStaged(const wxString& id)
 {
     for (const char* what : {"output", "ticket", "output.tmp", "ticket.tmp"})
-        unlink(Native(Staged(id, what)).c_str());
+        unlink(Native(StagedPath(id, what)).c_str());
 }
 
 JobOutcome ServiceJobs::Run(const ReadyToProcessJobInfo& job)
@@ -214,31 +213,73 @@ JobOutcome ServiceJobs::Continue(const wxString& id, ReadyToProcessJobInfo job)
                                        : wxString("the filter reported no output file"));
     }
 
-    // A name free for the output and its ticket alike.
+    if (!Stage(workConfig, StagedPath(id, "ticket"), false, error) ||
+        !Stage(output.producedPath, StagedPath(id, "output"), output.passThrough, error))
+    {
+        RemoveStaged(id);
+        return Fail(id, job.jobName, "cannot deliver the output: " + error);
+    }
+    // A name free for the output and its ticket alike, and not chosen by
+    // another job of the batch.
     wxString name;
     for (int attempt = 1; attempt < 10000 && name.empty(); ++attempt)
     {
         const wxString candidate = NumberedName(output.outputName, attempt);
         const wxString target = wxFileName(m_places.outputFolder, candidate).GetFullPath();
-        if (!Exists(target) && !Exists(target + JobRunner::kTicketSuffix))
+        bool chosen = false;
+        for (const Staged& staged : m_staged)
+            chosen = chosen || staged.name == candidate;
+        if (!chosen && !Exists(target) && !Exists(target + JobRunner::kTicketSuffix))
             name = candidate;
     }
-    if (name.empty() || !m_journal.RecordDelivery(id, name))
-        return Fail(id, job.jobName, "cannot record the delivery in the journal");
-    if (!Stage(workConfig, Staged(id, "ticket"), false, error) ||
-        !Stage(output.producedPath, Staged(id, "output"), output.passThrough, error))
+    if (name.empty())
     {
         RemoveStaged(id);
-        return Fail(id, job.jobName, "cannot deliver the output: " + error);
+        return Fail(id, job.jobName, "cannot find a free name for " + output.outputName);
     }
-    return Deliver(id, name, job.jobName);
+    m_staged.push_back(Staged{id, name, job.jobName});
+    return JobOutcome::Done;
 }
 
-JobOutcome ServiceJobs::Deliver(const wxString& id, const wxString& recordedName,
-                                const wxString& jobName)
+void ServiceJobs::Commit()
 {
-    wxString name = recordedName;
-    const wxString output = Staged(id, "output");
+    if (m_staged.empty())
+        return;
+    std::vector<Staged> batch;
+    batch.swap(m_staged);
+    // Staged bytes on disk before any record names them. Each file on its
+    // own: a sync of the whole file system would wait for every other
+    // writer's data too.
+    for (const Staged& staged : batch)
+        for (const char* what : {"ticket", "output"})
+            SyncPath(StagedPath(staged.id, what));
+    std::vector<std::pair<wxString, wxString>> records;
+    for (const Staged& staged : batch)
+        records.emplace_back(staged.id, staged.name);
+    if (!m_journal.RecordDeliveries(records))
+    {
+        for (const Staged& staged : batch)
+        {
+            RemoveStaged(staged.id);
+            Fail(staged.id, staged.jobName, "cannot record the delivery in the journal");
+        }
+        return;
+    }
+    std::vector<Staged> placed;
+    for (Staged& staged : batch)
+        if (Place(staged.id, staged.name, staged.jobName))
+            placed.push_back(staged);
+    // The outputs are on disk under their names before the originals leave
+    // the work directories: a power loss then finds them delivered, never missing.
+    SyncPath(m_places.outputFolder);
+    for (const Staged& staged : placed)
+        KeepOriginals(staged.id, staged.jobName + " -> " +
+                                     wxFileName(m_places.outputFolder, staged.name).GetFullPath());
+}
+
+bool ServiceJobs::Place(const wxString& id, wxString& name, const wxString& jobName)
+{
+    const wxString output = StagedPath(id, "output");
     while (Exists(output))
     {
         const wxString target = wxFileName(m_places.outputFolder, name).GetFullPath();
@@ -248,20 +289,31 @@ JobOutcome ServiceJobs::Deliver(const wxString& id, const wxString& recordedName
         {
             const wxString reason = Reason(errno);
             RemoveStaged(id);
-            return Fail(id, jobName, "cannot deliver the output: " + reason);
+            Fail(id, jobName, "cannot deliver the output: " + reason);
+            return false;
         }
         // Someone else took the name since it was chosen: the next one, recorded first.
         name = NumberedName(name, 2);
-        if (!m_journal.RecordDelivery(id, name))
-            return Fail(id, jobName, "cannot record the delivery in the journal");
+        if (!m_journal.RecordDeliveries({{id, name}}))
+        {
+            Fail(id, jobName, "cannot record the delivery in the journal");
+            return false;
+        }
     }
-    const wxString ticket = Staged(id, "ticket");
-    wxString placed, error;
+    const wxString ticket = StagedPath(id, "ticket");
+    wxString placedTicket, error;
     if (Exists(ticket) && !MoveIntoDirectory(ticket, m_places.outputFolder,
-                                             name + JobRunner::kTicketSuffix, placed, error))
+                                             name + JobRunner::kTicketSuffix, placedTicket, error))
         ServiceLog(Severity::Warning, jobName + ": the job ticket stays at " + ticket);
-    // The output is on disk under its name before the original leaves the
-    // work directory: a power loss then finds it delivered, never missing.
+    return true;
+}
+
+JobOutcome ServiceJobs::Deliver(const wxString& id, const wxString& recordedName,
+                                const wxString& jobName)
+{
+    wxString name = recordedName;
+    if (!Place(id, name, jobName))
+        return JobOutcome::Failed;
     SyncPath(m_places.outputFolder);
     return KeepOriginals(id,
                          jobName + " -> " + wxFileName(m_places.outputFolder, name).GetFullPath());
@@ -348,7 +400,6 @@ void ServiceJobs::Recover()
             kill(static_cast<pid_t>(pid), 0) != 0 && errno == ESRCH)
             unlink(Native(wxFileName(m_places.outputFolder, entry).GetFullPath()).c_str());
     }
-    bool inHand = false;
     for (const wxString& entry : EntryNames(m_places.workFolder))
     {
         const wxString work = wxFileName(m_places.workFolder, entry).GetFullPath();
@@ -369,10 +420,9 @@ void ServiceJobs::Recover()
         }
         const wxString jobName = wxFileName(originals[0]).GetFullName();
         const wxString name = m_journal.DeliveryOf(entry);
-        JobOutcome outcome;
-        if (!name.empty() && (Exists(Staged(entry, "output")) ||
+        if (!name.empty() && (Exists(StagedPath(entry, "output")) ||
                               Exists(wxFileName(m_places.outputFolder, name).GetFullPath())))
-            outcome = Deliver(entry, name, jobName);
+            Deliver(entry, name, jobName);
         else
         {
             FolderContent content;
@@ -382,11 +432,16 @@ void ServiceJobs::Recover()
             wxArrayString rejected;
             JobInfoCollection jobs;
             m_session.Filter().SniffFolder(m_hotFolder, rejected, jobs, contentPointer);
-            outcome = jobs.empty() ? Fail(entry, jobName, "the filter no longer accepts it")
-                                   : Continue(entry, jobs[0]);
+            if (jobs.empty())
+                Fail(entry, jobName, "the filter no longer accepts it");
+            else
+                Continue(entry, jobs[0]);
         }
-        inHand = inHand || outcome == JobOutcome::OriginalStuck;
     }
+    Commit();
+    bool inHand = false;
+    for (const wxString& entry : EntryNames(m_places.workFolder))
+        inHand = inHand || entry.StartsWith(kJobPrefix);
     if (!inHand)
         m_journal.Clear();
 }
