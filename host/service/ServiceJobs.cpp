@@ -392,14 +392,16 @@ void ServiceJobs::LogFailure(const wxString& name, const wxString& reason)
 
 void ServiceJobs::Recover()
 {
-    // Probes of the output folder left by a killed process.
-    for (const wxString& entry : EntryNames(m_places.outputFolder))
-    {
-        long pid = 0;
-        if (entry.StartsWith(".hotfolder-probe-") && entry.Mid(17).ToLong(&pid) && pid > 0 &&
-            kill(static_cast<pid_t>(pid), 0) != 0 && errno == ESRCH)
-            unlink(Native(wxFileName(m_places.outputFolder, entry).GetFullPath()).c_str());
-    }
+    // Write probes left by a killed process in the folders this one proved.
+    for (const wxString& directory :
+         {m_places.outputFolder, m_places.workFolder, m_places.failedFolder, m_places.keptFolder})
+        for (const wxString& entry : EntryNames(directory))
+        {
+            long pid = 0;
+            if (entry.StartsWith(".hotfolder-probe-") && entry.Mid(17).ToLong(&pid) && pid > 0 &&
+                kill(static_cast<pid_t>(pid), 0) != 0 && errno == ESRCH)
+                unlink(Native(wxFileName(directory, entry).GetFullPath()).c_str());
+        }
     for (const wxString& entry : EntryNames(m_places.workFolder))
     {
         const wxString work = wxFileName(m_places.workFolder, entry).GetFullPath();
