@@ -215,6 +215,16 @@ int main(int argc, char** argv)
     }
     close(inotify);
 
+    // The bursts get a service of their own, so its figures are theirs alone.
+    Run({host, "stop"}, scratch);
+    waitpid(service, nullptr, 0);
+    service = Spawn({host, "serve", "--stats"}, scratch + "/serve-out.txt", log);
+    if (!waitServing())
+    {
+        std::fprintf(stderr, "bench_service: the service did not start again\n");
+        return 1;
+    }
+
     // 2. and 3. Two bursts, memory before and after each.
     const long before = ResidentKilobytes(service);
     std::vector<long> after;
