@@ -10,11 +10,11 @@ using namespace service_test;
 TEST_F(ServiceTest, KilledAtAnyMomentEveryFileIsDeliveredExactlyOnce)
 {
     const std::vector<std::string> folders = {MakeFolder("a", "A4"), MakeFolder("b", "Letter")};
-    const int kKills = 100, kFilesPerFolderAndRound = 3;
+    const int kKills = 100, kFilesPerFolderAndRound = 5;
     std::mt19937 random(20240515);
-    std::uniform_int_distribution<int> delayMs(0, 90);
+    std::uniform_int_distribution<int> delayMs(5, 60);
     std::set<std::string> dropped;
-    int kills = 0;
+    int kills = 0, interrupted = 0; // kills that left a job in hand
     const auto started = std::chrono::steady_clock::now();
     for (; kills < kKills; ++kills)
     {
@@ -29,10 +29,14 @@ TEST_F(ServiceTest, KilledAtAnyMomentEveryFileIsDeliveredExactlyOnce)
                           0);
                 dropped.insert(folder + "/" + name);
             }
-        BackgroundHost host({"serve", "--settle", "100"}, scratch);
-        ASSERT_TRUE(host.Started());
-        std::this_thread::sleep_for(std::chrono::milliseconds(delayMs(random)));
-        // The destructor kills it with SIGKILL.
+        {
+            BackgroundHost host({"serve", "--settle", "100"}, scratch);
+            ASSERT_TRUE(host.Started());
+            std::this_thread::sleep_for(std::chrono::milliseconds(delayMs(random)));
+            // The destructor kills it with SIGKILL.
+        }
+        for (const std::string& folder : folders)
+            interrupted += !AllEntries(Work(folder)).empty();
     }
     // A last service runs until everything is through.
     {
@@ -53,7 +57,9 @@ TEST_F(ServiceTest, KilledAtAnyMomentEveryFileIsDeliveredExactlyOnce)
     }
     const double seconds =
         std::chrono::duration<double>(std::chrono::steady_clock::now() - started).count();
-    std::printf("%d kills, %zu files in %.1f s\n", kills, dropped.size(), seconds);
+    std::printf("%d kills (%d with a job in hand), %zu files in %.1f s\n", kills, interrupted,
+                dropped.size(), seconds);
+    EXPECT_GE(interrupted, kKills / 10) << "the kills missed the jobs";
 
     for (const std::string& folder : folders)
     {

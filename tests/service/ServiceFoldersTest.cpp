@@ -202,12 +202,24 @@ TEST_F(ServiceTest, StatusRemoveAndStop)
     EXPECT_NE(Host({"status"}).out.find("Service:       not running"), std::string::npos);
 
     auto host = Serve(2);
+    // StopHF pauses every folder until it goes.
+    WriteFile(Warehouse() + "/StopHF", "");
+    ASSERT_TRUE(WaitFor([&] { return host->Err().find("paused") != std::string::npos; }, 5000));
+    WriteFile(letter + "/held.eps", label);
+    std::this_thread::sleep_for(std::chrono::milliseconds(500));
+    EXPECT_TRUE(Exists(letter + "/held.eps"));
+    unlink((Warehouse() + "/StopHF").c_str());
+    EXPECT_TRUE(WaitFor([&] { return Exists(letter + "/Output/held.ps"); }, 5000)) << host->Err();
     EXPECT_EQ(Host({"remove", letter}).exitCode, 0);
     EXPECT_EQ(Host({"remove", letter}).exitCode, 3);
     EXPECT_EQ(Host({"status", "--json"}).out.find(letter), std::string::npos);
     EXPECT_TRUE(Exists(letter + "/" + kContainer)); // the folder stays
     hf_test::ProcessResult stop = Host({"stop"});
     EXPECT_EQ(stop.exitCode, 0) << stop.err;
+    EXPECT_EQ(host->Wait(5000), 0);
+    // SIGTERM ends it too (systemd's stop).
+    host = Serve(1);
+    host->Signal(SIGTERM);
     EXPECT_EQ(host->Wait(5000), 0);
     EXPECT_NE(Host({"serve", "--help"}).out.find("RunService"), std::string::npos);
 }
