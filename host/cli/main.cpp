@@ -7,6 +7,7 @@
 
 #include "cli/Commands.h"
 #include "cli/ConsoleText.h"
+#include "service/ServiceCommands.h"
 
 namespace
 {
@@ -35,6 +36,15 @@ const Command kCommands[] = {
      "write the server description of a printer from its PPD file", false},
     {"printers", [](int, char**, const Arguments& a) { return RunPrintersCommand(a); },
      "list the CUPS printers and the hot folders bound to them", false},
+    // The hot-folder service.
+    {"serve", [](int, char**, const Arguments& a) { return RunServeCommand(a); },
+     "serve every listed hot folder (the hot-folder service)", false},
+    {"stop", [](int, char**, const Arguments& a) { return RunStopCommand(a); },
+     "ask the hot-folder service to end", false},
+    {"status", [](int, char**, const Arguments& a) { return RunStatusCommand(a); },
+     "tell what the hot-folder service and each listed folder are doing", false},
+    {"remove", [](int, char**, const Arguments& a) { return RunRemoveCommand(a); },
+     "take a folder off the hot-folder list", false},
 };
 
 const char kUsageHead[] = "usage: hotfolder <command> [options]\n"

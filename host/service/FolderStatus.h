@@ -1,0 +1,21 @@
+#pragma once
+#include <wx/string.h>
+
+// What "hotfolder status" tells of one listed folder. The counts come from
+// what the jobs leave behind, so they hold whichever process ran the jobs:
+// done jobs are the originals in the kept-originals folder (today: moved
+// there since local midnight), failed jobs the lines of failed-jobs.log.
+struct FolderStatus
+{
+    wxString path;
+    wxString problem; // why the folder cannot be served; empty when it can
+    wxString server;  // the bound server's name; empty when none
+    wxString outputType;
+    wxString page;
+    size_t waiting = 0;
+    size_t doneToday = 0, doneTotal = 0;
+    size_t failedToday = 0, failedTotal = 0;
+    wxString lastFailure;
+};
+
+FolderStatus ReadFolderStatus(const wxString& path);

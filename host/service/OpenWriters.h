@@ -1,0 +1,11 @@
+#pragma once
+#include <set>
+#include <utility>
+
+#include <sys/types.h>
+
+// A file by its device and inode number, so names and links do not matter.
+using FileIdentity = std::pair<dev_t, ino_t>;
+
+// Of files, those that some process of this machine holds open for writing.
+std::set<FileIdentity> FindFilesOpenForWriting(const std::set<FileIdentity>& files);

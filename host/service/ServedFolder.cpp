@@ -1,0 +1,158 @@
+#include "service/ServedFolder.h"
+
+#include <sys/stat.h>
+
+#include <wx/filename.h>
+
+#include "db/PathResolver.h"
+#include "folder/FileMoves.h"
+#include "folder/ServerDescription.h"
+#include "module/FilterSession.h"
+#include "service/OpenWriters.h"
+#include "service/ServiceLog.h"
+
+std::unique_ptr<ServedFolder> ServedFolder::Open(const wxString& path, const wxString& modulePath,
+                                                 std::chrono::milliseconds settle, wxString& error)
+{
+    std::unique_ptr<ServedFolder> served(new ServedFolder(settle));
+    HotFolder& folder = served->m_folder;
+    if (!folder.Open(path, error))
+        return nullptr;
+    ServerDescription server;
+    if (wxFileName::FileExists(folder.GetServerDescriptionFile()) &&
+        !server.Load(folder.GetServerDescriptionFile(), error))
+        return nullptr;
+
+    JobPlaces& places = served->m_places;
+    places.configFile = folder.GetConfigFile();
+    places.workFolder = folder.GetWorkFolder();
+    places.failedFolder = folder.GetFailedFolder();
+    places.keptFolder = folder.GetKeptOriginalsFolder();
+    places.outputFolder = folder.GetDefaultOutputFolder();
+    for (const wxString& directory :
+         {places.outputFolder, places.workFolder, places.failedFolder, places.keptFolder})
+        if (!EnsureWritableDirectory(directory, error))
+            return nullptr;
+
+    served->m_session =
+        FilterSession::Start(modulePath, server.GetText(), &folder.GetFilterSetting(), error);
+    if (!served->m_session)
+        return nullptr;
+    const wxArrayString missing =
+        server.MissingFeatures(served->m_session->Info().m_arrRequiredServerFeatures);
+    if (!missing.empty())
+        ServiceLog(Severity::Warning, path + ": the server description does not offer " +
+                                          wxJoin(missing, ' ') + ", which the filter needs");
+    if (!served->m_journal.Open(db::PathResolver::GetContainerFolderPath(folder.GetFolder()),
+                                error))
+        return nullptr;
+    served->m_jobs.reset(new ServiceJobs(*served->m_session, places, folder.GetFolder(),
+                                         served->m_journal, served->m_statistics));
+    served->m_jobs->Recover();
+    // What waits already is taken as if it had just arrived.
+    served->OfferAll();
+    return served;
+}
+
+ServedFolder::~ServedFolder() = default;
+
+void ServedFolder::OfferAll()
+{
+    for (const wxString& path : ListFolderFiles(Path()))
+        m_offered.insert(wxFileName(path).GetFullName());
+}
+
+bool ServedFolder::Rescan()
+{
+    struct stat info;
+    if (stat(Path().fn_str(), &info) != 0 || !S_ISDIR(info.st_mode))
+        return false;
+    for (const wxString& path : m_settle.Settled(ListFolderFiles(Path())))
+        if (!IsSetAside(path))
+            m_offered.insert(wxFileName(path).GetFullName());
+    return true;
+}
+
+bool ServedFolder::IsSetAside(const wxString& path) const
+{
+    auto it = m_setAside.find(path);
+    long long size = -1, mtime = -1;
+    return it != m_setAside.end() && FileSignature(path, size, mtime) &&
+           it->second == std::make_pair(size, mtime);
+}
+
+void ServedFolder::SetAside(const wxString& path)
+{
+    long long size = -1, mtime = -1;
+    if (FileSignature(path, size, mtime))
+        m_setAside[path] = std::make_pair(size, mtime);
+}
+
+size_t ServedFolder::TakeOffered(size_t limit, const std::function<bool()>& stop)
+{
+    // Regular, visible files only: a FIFO or a device is never opened.
+    std::map<FileIdentity, wxString> candidates;
+    while (!m_offered.empty() && candidates.size() < limit)
+    {
+        const wxString name = *m_offered.begin();
+        m_offered.erase(m_offered.begin());
+        if (name.empty() || name[0] == '.')
+            continue;
+        const wxString path = wxFileName(Path(), name).GetFullPath();
+        struct stat info;
+        if (stat(path.fn_str(), &info) != 0 || !S_ISREG(info.st_mode) || IsSetAside(path))
+            continue;
+        candidates[FileIdentity(info.st_dev, info.st_ino)] = path;
+    }
+    if (candidates.empty())
+        return 0;
+    std::set<FileIdentity> identities;
+    for (const auto& candidate : candidates)
+        identities.insert(candidate.first);
+    // A file still open for writing is left for its writer's close event
+    // (or, without one, the rescan).
+    for (const FileIdentity& open : FindFilesOpenForWriting(identities))
+        candidates.erase(open);
+    if (candidates.empty())
+        return 0;
+
+    FolderContent content;
+    for (const auto& candidate : candidates)
+        content.m_arrFiles.Add(candidate.second);
+    FolderContent* contentPointer = &content;
+    wxArrayString rejected;
+    JobInfoCollection jobs;
+    {
+        ScopedSeconds timing(m_statistics.sniffSeconds);
+        m_session->Filter().SniffFolder(Path(), rejected, jobs, contentPointer);
+    }
+    std::set<wxString> taken;
+    for (size_t i = 0; i < jobs.size(); ++i)
+        for (const wxString& file : jobs[i].files)
+            taken.insert(file);
+    for (const auto& candidate : candidates)
+        if (!taken.count(candidate.second))
+        {
+            ++m_statistics.refused;
+            SetAside(candidate.second);
+            ServiceLog(Severity::Warning, "refused (left in place): " + candidate.second);
+        }
+    size_t run = 0;
+    for (size_t i = 0; i < jobs.size(); ++i)
+    {
+        if (stop())
+        {
+            // Not taken: offered again when the service next looks.
+            for (size_t j = i; j < jobs.size(); ++j)
+                for (const wxString& file : jobs[j].files)
+                    m_offered.insert(wxFileName(file).GetFullName());
+            break;
+        }
+        ++run;
+        if (m_jobs->Run(jobs[i]) == JobOutcome::OriginalStuck)
+            for (const wxString& file : jobs[i].files)
+                SetAside(file);
+    }
+    m_jobs->Commit();
+    return run;
+}

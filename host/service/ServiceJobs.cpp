@@ -1,0 +1,459 @@
+#include "service/ServiceJobs.h"
+
+#include <cerrno>
+#include <chrono>
+#include <cstdio>
+#include <cstring>
+#include <dirent.h>
+#include <fcntl.h>
+#include <signal.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <wx/datetime.h>
+#include <wx/filename.h>
+
+#include "cli/ConsoleText.h"
+#include "folder/FileMoves.h"
+#include "jobs/JobExecution.h"
+#include "jobs/RunStatistics.h"
+#include "module/FilterSession.h"
+#include "service/FolderJournal.h"
+#include "service/ServiceLog.h"
+
+namespace
+{
+const char kJobPrefix[] = "svc-";
+const char kOriginals[] = "original";
+const size_t kSyncWholeBatch = 8;
+
+std::string Native(const wxString& path)
+{
+    return std::string(path.fn_str());
+}
+
+wxString Reason(int error)
+{
+    return wxString::FromUTF8(std::strerror(error));
+}
+
+bool Exists(const wxString& path)
+{
+    struct stat info;
+    return lstat(Native(path).c_str(), &info) == 0;
+}
+
+// Data or directory entries on disk before the next step depends on them.
+void SyncPath(const wxString& path)
+{
+    int fd = open(Native(path).c_str(), O_RDONLY | O_CLOEXEC);
+    if (fd >= 0)
+    {
+        fsync(fd);
+        close(fd);
+    }
+}
+
+int RenameNoReplace(const wxString& from, const wxString& to)
+{
+    return renameat2(AT_FDCWD, Native(from).c_str(), AT_FDCWD, Native(to).c_str(),
+                     RENAME_NOREPLACE);
+}
+
+std::vector<wxString> EntryNames(const wxString& directory)
+{
+    std::vector<wxString> names;
+    if (DIR* dir = opendir(Native(directory).c_str()))
+    {
+        while (struct dirent* entry = readdir(dir))
+            if (std::strcmp(entry->d_name, ".") != 0 && std::strcmp(entry->d_name, "..") != 0)
+                names.push_back(wxString(entry->d_name, *wxConvFileName));
+        closedir(dir);
+    }
+    return names;
+}
+
+wxString NewJobId()
+{
+    static unsigned counter = 0;
+    auto now = std::chrono::system_clock::now().time_since_epoch();
+    long long micros = std::chrono::duration_cast<std::chrono::microseconds>(now).count();
+    return wxString::Format("%s%lld-%d-%u", kJobPrefix, micros, static_cast<int>(getpid()),
+                            ++counter);
+}
+
+void RemoveEntry(const wxString& path)
+{
+    struct stat info;
+    if (lstat(Native(path).c_str(), &info) != 0)
+        return;
+    if (S_ISDIR(info.st_mode))
+        RemoveTree(path);
+    else
+        unlink(Native(path).c_str());
+}
+
+// Into a hidden name of the target's directory: a rename when both lie on one
+// file system, else a copy under a ".tmp" name renamed once whole and synced,
+// so the staged name never holds half a file.
+bool Stage(const wxString& from, const wxString& to, bool copy, wxString& error)
+{
+    if (!copy)
+    {
+        if (rename(Native(from).c_str(), Native(to).c_str()) == 0)
+            return true;
+        if (errno != EXDEV)
+        {
+            error = wxString::Format("cannot move %s to %s: %s", from, to, Reason(errno));
+            return false;
+        }
+    }
+    const wxString temporary = to + ".tmp";
+    unlink(Native(temporary).c_str());
+    if (!CopyFileTo(from, temporary, error)) // synced with the batch
+        return false;
+    if (rename(Native(temporary).c_str(), Native(to).c_str()) != 0)
+    {
+        error = wxString::Format("cannot move %s to %s: %s", temporary, to, Reason(errno));
+        unlink(Native(temporary).c_str());
+        return false;
+    }
+    return true;
+}
+} // namespace
+
+wxString ServiceJobs::WorkDirectory(const wxString& id) const
+{
+    return wxFileName(m_places.workFolder, id).GetFullPath();
+}
+
+wxString ServiceJobs::OriginalsDirectory(const wxString& id) const
+{
+    return wxFileName(WorkDirectory(id), kOriginals).GetFullPath();
+}
+
+wxString ServiceJobs::StagedPath(const wxString& id, const char* what) const
+{
+    return wxFileName(m_places.outputFolder, ".hf-" + id + "." + what).GetFullPath();
+}
+
+std::vector<wxString> ServiceJobs::Originals(const wxString& id) const
+{
+    std::vector<wxString> paths;
+    const wxString directory = OriginalsDirectory(id);
+    for (const wxString& name : EntryNames(directory))
+        paths.push_back(wxFileName(directory, name).GetFullPath());
+    return paths;
+}
+
+void ServiceJobs::RemoveStaged(const wxString& id)
+{
+    for (const char* what : {"output", "ticket", "output.tmp", "ticket.tmp"})
+        unlink(Native(StagedPath(id, what)).c_str());
+}
+
+JobOutcome ServiceJobs::Run(const ReadyToProcessJobInfo& job)
+{
+    const wxString id = NewJobId();
+    const wxString work = WorkDirectory(id);
+    if (mkdir(Native(work).c_str(), 0777) != 0 ||
+        mkdir(Native(OriginalsDirectory(id)).c_str(), 0777) != 0)
+    {
+        ServiceLog(Severity::Error,
+                   wxString::Format("%s: cannot make a work directory in %s: %s", job.jobName,
+                                    m_places.workFolder, Reason(errno)));
+        RemoveTree(work);
+        return JobOutcome::OriginalStuck;
+    }
+    ReadyToProcessJobInfo claimed = job;
+    claimed.files.clear();
+    for (const wxString& file : job.files)
+    {
+        const wxString name = wxFileName(file).GetFullName();
+        const wxString target = wxFileName(OriginalsDirectory(id), name).GetFullPath();
+        wxString moved, error;
+        if (RenameNoReplace(file, target) == 0)
+            claimed.files.Add(target);
+        else if (errno == ENOENT)
+            ServiceLog(Severity::Warning, file + " vanished before it was taken");
+        else if (errno == EXDEV &&
+                 MoveIntoDirectory(file, OriginalsDirectory(id), name, moved, error))
+            claimed.files.Add(moved);
+        else
+            ServiceLog(Severity::Error,
+                       "cannot take " + file + ": " + (error.empty() ? Reason(errno) : error));
+    }
+    if (claimed.files.empty())
+    {
+        RemoveTree(work);
+        return JobOutcome::Failed;
+    }
+    return Continue(id, claimed);
+}
+
+JobOutcome ServiceJobs::Continue(const wxString& id, ReadyToProcessJobInfo job)
+{
+    // From step 2 afresh: whatever an earlier attempt left goes.
+    const wxString work = WorkDirectory(id);
+    for (const wxString& name : EntryNames(work))
+        if (name != kOriginals)
+            RemoveEntry(wxFileName(work, name).GetFullPath());
+    RemoveStaged(id);
+
+    wxString error;
+    const wxString workConfig = wxFileName(work, "Folder.cfg").GetFullPath();
+    if (!CopyFileTo(m_places.configFile, workConfig, error))
+        return Fail(id, job.jobName, error);
+    JobOutput output = ProcessJob(m_session.Filter(), job, work, nullptr);
+    m_statistics.processSeconds += output.processSeconds;
+    if (output.status != 0 || output.producedPath.empty())
+    {
+        m_session.ClearStatusAfterFailure();
+        return Fail(id, job.jobName,
+                    output.status != 0 ? m_session.DescribeStatus(output.status)
+                                       : wxString("the filter reported no output file"));
+    }
+
+    if (!Stage(workConfig, StagedPath(id, "ticket"), false, error) ||
+        !Stage(output.producedPath, StagedPath(id, "output"), output.passThrough, error))
+    {
+        RemoveStaged(id);
+        return Fail(id, job.jobName, "cannot deliver the output: " + error);
+    }
+    // A name free for the output and its ticket alike, and not chosen by
+    // another job of the batch.
+    wxString name;
+    for (int attempt = 1; attempt < 10000 && name.empty(); ++attempt)
+    {
+        const wxString candidate = NumberedName(output.outputName, attempt);
+        const wxString target = wxFileName(m_places.outputFolder, candidate).GetFullPath();
+        bool chosen = false;
+        for (const Staged& staged : m_staged)
+            chosen = chosen || staged.name == candidate;
+        if (!chosen && !Exists(target) && !Exists(target + JobRunner::kTicketSuffix))
+            name = candidate;
+    }
+    if (name.empty())
+    {
+        RemoveStaged(id);
+        return Fail(id, job.jobName, "cannot find a free name for " + output.outputName);
+    }
+    m_staged.push_back(Staged{id, name, job.jobName});
+    return JobOutcome::Done;
+}
+
+void ServiceJobs::Commit()
+{
+    if (m_staged.empty())
+        return;
+    std::vector<Staged> batch;
+    batch.swap(m_staged);
+    // Staged bytes on disk before any record names them: file by file for a
+    // few jobs; for a large batch one sync of the file system is cheaper
+    // than a sync per file, though it waits for other writers' data too.
+    int folder = -1;
+    if (batch.size() >= kSyncWholeBatch)
+        folder = open(Native(m_places.outputFolder).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    if (folder >= 0)
+    {
+        syncfs(folder);
+        close(folder);
+    }
+    else
+        for (const Staged& staged : batch)
+            for (const char* what : {"ticket", "output"})
+                SyncPath(StagedPath(staged.id, what));
+    std::vector<std::pair<wxString, wxString>> records;
+    for (const Staged& staged : batch)
+        records.emplace_back(staged.id, staged.name);
+    if (!m_journal.RecordDeliveries(records))
+    {
+        for (const Staged& staged : batch)
+        {
+            RemoveStaged(staged.id);
+            Fail(staged.id, staged.jobName, "cannot record the delivery in the journal");
+        }
+        return;
+    }
+    std::vector<Staged> placed;
+    for (Staged& staged : batch)
+        if (Place(staged.id, staged.name, staged.jobName))
+            placed.push_back(staged);
+    // The outputs are on disk under their names before the originals leave
+    // the work directories: a power loss then finds them delivered, never missing.
+    SyncPath(m_places.outputFolder);
+    for (const Staged& staged : placed)
+        KeepOriginals(staged.id, staged.jobName + " -> " +
+                                     wxFileName(m_places.outputFolder, staged.name).GetFullPath());
+}
+
+bool ServiceJobs::Place(const wxString& id, wxString& name, const wxString& jobName)
+{
+    const wxString output = StagedPath(id, "output");
+    while (Exists(output))
+    {
+        const wxString target = wxFileName(m_places.outputFolder, name).GetFullPath();
+        if (RenameNoReplace(output, target) == 0)
+            break;
+        if (errno != EEXIST)
+        {
+            const wxString reason = Reason(errno);
+            RemoveStaged(id);
+            Fail(id, jobName, "cannot deliver the output: " + reason);
+            return false;
+        }
+        // Someone else took the name since it was chosen: the next one, recorded first.
+        name = NumberedName(name, 2);
+        if (!m_journal.RecordDeliveries({{id, name}}))
+        {
+            Fail(id, jobName, "cannot record the delivery in the journal");
+            return false;
+        }
+    }
+    const wxString ticket = StagedPath(id, "ticket");
+    wxString placedTicket, error;
+    if (Exists(ticket) && !MoveIntoDirectory(ticket, m_places.outputFolder,
+                                             name + JobRunner::kTicketSuffix, placedTicket, error))
+        ServiceLog(Severity::Warning, jobName + ": the job ticket stays at " + ticket);
+    return true;
+}
+
+JobOutcome ServiceJobs::Deliver(const wxString& id, const wxString& recordedName,
+                                const wxString& jobName)
+{
+    wxString name = recordedName;
+    if (!Place(id, name, jobName))
+        return JobOutcome::Failed;
+    SyncPath(m_places.outputFolder);
+    return KeepOriginals(id,
+                         jobName + " -> " + wxFileName(m_places.outputFolder, name).GetFullPath());
+}
+
+JobOutcome ServiceJobs::KeepOriginals(const wxString& id, const wxString& result)
+{
+    for (const wxString& file : Originals(id))
+    {
+        wxString kept, error;
+        if (!MoveIntoDirectory(file, m_places.keptFolder, wxFileName(file).GetFullName(), kept,
+                               error))
+        {
+            ++m_statistics.failed;
+            ServiceLog(Severity::Error,
+                       result + "; the original stays in the work folder: " + error);
+            return JobOutcome::OriginalStuck;
+        }
+    }
+    RemoveTree(WorkDirectory(id));
+    ++m_statistics.done;
+    ServiceLog(Severity::Info, result);
+    if (m_journal.Large())
+    {
+        bool inHand = false;
+        for (const wxString& name : EntryNames(m_places.workFolder))
+            inHand = inHand || name.StartsWith(kJobPrefix);
+        if (!inHand)
+            m_journal.Clear();
+    }
+    return JobOutcome::Done;
+}
+
+JobOutcome ServiceJobs::Fail(const wxString& id, const wxString& jobName, const wxString& reason)
+{
+    ++m_statistics.failed;
+    LogFailure(jobName, reason);
+    JobOutcome outcome = JobOutcome::Failed;
+    for (const wxString& file : Originals(id))
+    {
+        wxString moved, error;
+        if (MoveIntoDirectory(file, m_places.failedFolder, wxFileName(file).GetFullName(), moved,
+                              error))
+            ServiceLog(Severity::Error, jobName + ": failed: " + reason + "; moved to " + moved);
+        else
+        {
+            ServiceLog(Severity::Error, jobName + ": failed: " + reason +
+                                            "; the original stays in the work folder: " + error);
+            outcome = JobOutcome::OriginalStuck;
+        }
+    }
+    if (outcome == JobOutcome::Failed)
+    {
+        RemoveStaged(id);
+        RemoveTree(WorkDirectory(id));
+    }
+    return outcome;
+}
+
+void ServiceJobs::LogFailure(const wxString& name, const wxString& reason)
+{
+    const wxString path =
+        wxFileName(m_places.failedFolder, JobRunner::kFailureLogName).GetFullPath();
+    // Append mode: whole lines, whoever else writes the log.
+    FILE* log = std::fopen(Native(path).c_str(), "a");
+    if (!log)
+    {
+        ServiceLog(Severity::Error, "cannot write the failure log " + path);
+        return;
+    }
+    const wxString line =
+        wxDateTime::Now().FormatISOCombined(' ') + "\t" + name + "\t" + reason + "\n";
+    std::fputs(ToUtf8(line).c_str(), log);
+    std::fclose(log);
+}
+
+void ServiceJobs::Recover()
+{
+    // Write probes left by a killed process in the folders this one proved.
+    for (const wxString& directory :
+         {m_places.outputFolder, m_places.workFolder, m_places.failedFolder, m_places.keptFolder})
+        for (const wxString& entry : EntryNames(directory))
+        {
+            long pid = 0;
+            if (entry.StartsWith(".hotfolder-probe-") && entry.Mid(17).ToLong(&pid) && pid > 0 &&
+                kill(static_cast<pid_t>(pid), 0) != 0 && errno == ESRCH)
+                unlink(Native(wxFileName(directory, entry).GetFullPath()).c_str());
+        }
+    for (const wxString& entry : EntryNames(m_places.workFolder))
+    {
+        const wxString work = wxFileName(m_places.workFolder, entry).GetFullPath();
+        if (!entry.StartsWith(kJobPrefix))
+        {
+            // A killed "run" left it; its original never left the hot folder.
+            if (entry.StartsWith("job-"))
+                RemoveTree(work);
+            continue;
+        }
+        const std::vector<wxString> originals = Originals(entry);
+        if (originals.empty())
+        {
+            // Never claimed anything, or finished but for the clean-up.
+            RemoveStaged(entry);
+            RemoveTree(work);
+            continue;
+        }
+        const wxString jobName = wxFileName(originals[0]).GetFullName();
+        const wxString name = m_journal.DeliveryOf(entry);
+        if (!name.empty() && (Exists(StagedPath(entry, "output")) ||
+                              Exists(wxFileName(m_places.outputFolder, name).GetFullPath())))
+            Deliver(entry, name, jobName);
+        else
+        {
+            FolderContent content;
+            for (const wxString& file : originals)
+                content.m_arrFiles.Add(file);
+            FolderContent* contentPointer = &content;
+            wxArrayString rejected;
+            JobInfoCollection jobs;
+            m_session.Filter().SniffFolder(m_hotFolder, rejected, jobs, contentPointer);
+            if (jobs.empty())
+                Fail(entry, jobName, "the filter no longer accepts it");
+            else
+                Continue(entry, jobs[0]);
+        }
+    }
+    Commit();
+    bool inHand = false;
+    for (const wxString& entry : EntryNames(m_places.workFolder))
+        inHand = inHand || entry.StartsWith(kJobPrefix);
+    if (!inHand)
+        m_journal.Clear();
+}

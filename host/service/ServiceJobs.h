@@ -1,0 +1,76 @@
+#pragma once
+#include <vector>
+
+#include <hotfolder/HFPlugin.h>
+
+#include "jobs/JobRunner.h"
+
+class FilterSession;
+class FolderJournal;
+class RunStatistics;
+
+// The service's road of one job, made so that a kill at any instant leaves,
+// after a restart, each original kept once and one whole output per
+// original. Every job has a work directory "svc-<id>" in the work folder:
+//
+// 1. The originals are claimed: renamed from the hot folder into
+//    "svc-<id>/original/". From here on the work directory, not the hot
+//    folder, says the job is in hand.
+// 2. Process writes the output (and merges the job overrides into the work
+//    copy of Folder.cfg) in the work directory.
+// 3. Ticket and output are staged in the output folder under hidden names
+//    ".hf-<id>.ticket" and ".hf-<id>.output" (a copy goes to a ".tmp" name
+//    first and is renamed when whole), and a free output name is chosen.
+// 4. For the whole batch at once: the staged files are synced to disk, then
+//    the chosen names are recorded in the folder's journal (synced), then
+//    output and ticket are renamed to their final names without replacing
+//    anything, and the output folder is synced.
+// 5. The originals move to the kept-originals folder; the work directory goes.
+// Doing step 4 once per batch keeps the disk syncs off the cost of each job.
+//
+// At start the work folder is replayed: a work directory without originals
+// is removed; one whose recorded output is staged or delivered is finished
+// from step 4 or 5; any other is processed again from step 2.
+class ServiceJobs
+{
+public:
+    ServiceJobs(FilterSession& session, const JobPlaces& places, const wxString& hotFolder,
+                FolderJournal& journal, RunStatistics& statistics)
+        : m_session(session), m_places(places), m_hotFolder(hotFolder), m_journal(journal),
+          m_statistics(statistics)
+    {
+    }
+
+    // Claims the job's files and takes them through step 3; a failure ends
+    // it at once.
+    JobOutcome Run(const ReadyToProcessJobInfo& job);
+    // Delivers every job staged since the last call (steps 4 and 5).
+    void Commit();
+    // Finishes or cleans what an earlier service left in the work folder.
+    void Recover();
+
+private:
+    JobOutcome Continue(const wxString& id, ReadyToProcessJobInfo job);
+    struct Staged
+    {
+        wxString id, name, jobName;
+    };
+    // Renames the staged output and ticket; false after failing the job.
+    bool Place(const wxString& id, wxString& name, const wxString& jobName);
+    JobOutcome Deliver(const wxString& id, const wxString& recordedName, const wxString& jobName);
+    JobOutcome KeepOriginals(const wxString& id, const wxString& result);
+    JobOutcome Fail(const wxString& id, const wxString& name, const wxString& reason);
+    void RemoveStaged(const wxString& id);
+    void LogFailure(const wxString& name, const wxString& reason);
+    wxString WorkDirectory(const wxString& id) const;
+    wxString OriginalsDirectory(const wxString& id) const;
+    wxString StagedPath(const wxString& id, const char* what) const;
+    std::vector<wxString> Originals(const wxString& id) const;
+
+    FilterSession& m_session;
+    JobPlaces m_places;
+    wxString m_hotFolder;
+    FolderJournal& m_journal;
+    RunStatistics& m_statistics;
+    std::vector<Staged> m_staged;
+};

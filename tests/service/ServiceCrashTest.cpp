@@ -1,0 +1,99 @@
+// The service killed with SIGKILL at seeded random moments while files flow
+// through two folders, restarted each time: afterwards every original is
+// kept once and has exactly one whole output, and nothing is left behind.
+#include <random>
+
+#include "ServiceTestSupport.h"
+
+using namespace service_test;
+
+TEST_F(ServiceTest, KilledAtAnyMomentEveryFileIsDeliveredExactlyOnce)
+{
+    const std::vector<std::string> folders = {MakeFolder("a", "A4"), MakeFolder("b", "Letter")};
+    const int kKills = 100, kFilesPerFolderAndRound = 5;
+    std::mt19937 random(20240515);
+    std::uniform_int_distribution<int> delayMs(0, 25);
+    std::set<std::string> dropped;
+    int kills = 0, interrupted = 0; // kills that left a job in hand
+    const auto started = std::chrono::steady_clock::now();
+    for (; kills < kKills; ++kills)
+    {
+        // Files arrive complete (renamed in), some while the service is down.
+        for (const std::string& folder : folders)
+            for (int i = 0; i < kFilesPerFolderAndRound; ++i)
+            {
+                const std::string name = "f" + std::to_string(kills) + "-" + std::to_string(i);
+                WriteFile(scratch + "/.incoming", label);
+                ASSERT_EQ(rename((scratch + "/.incoming").c_str(),
+                                 (folder + "/" + name + ".eps").c_str()),
+                          0);
+                dropped.insert(folder + "/" + name);
+            }
+        {
+            BackgroundHost host({"serve", "--settle", "100"}, scratch);
+            ASSERT_TRUE(host.Started());
+            // Mostly timed from the start of serving, so a slow start
+            // (sanitizers) does not swallow the kills; sometimes from the
+            // spawn, to catch the replay of the work folders too.
+            const bool fromSpawn = random() % 4 == 0;
+            for (int waited = 0; !fromSpawn && waited < 10000 &&
+                                 host.Err().find("serving " + folders[1]) == std::string::npos;
+                 ++waited)
+                std::this_thread::sleep_for(std::chrono::milliseconds(1));
+            std::this_thread::sleep_for(
+                std::chrono::milliseconds(delayMs(random) * (fromSpawn ? 3 : 1)));
+            // The destructor kills it with SIGKILL.
+        }
+        for (const std::string& folder : folders)
+            interrupted += !AllEntries(Work(folder)).empty();
+    }
+    // A last service runs until everything is through.
+    {
+        BackgroundHost host({"serve", "--settle", "100"}, scratch);
+        ASSERT_TRUE(WaitFor(
+            [&]
+            {
+                for (const std::string& folder : folders)
+                    if (!ListDirectory(Work(folder)).empty() ||
+                        ListDirectory(folder).size() != 2) // the container and Output
+                        return false;
+                return true;
+            },
+            60000))
+            << host.Err();
+        EXPECT_EQ(Host({"stop"}).exitCode, 0);
+        EXPECT_EQ(host.Wait(10000), 0) << host.Err();
+    }
+    const double seconds =
+        std::chrono::duration<double>(std::chrono::steady_clock::now() - started).count();
+    std::printf("%d kills (%d with a job in hand), %zu files in %.1f s\n", kills, interrupted,
+                dropped.size(), seconds);
+    EXPECT_GE(interrupted, kKills / 10) << "the kills missed the jobs";
+
+    for (const std::string& folder : folders)
+    {
+        std::set<std::string> expectedKept, expectedOutput;
+        for (const std::string& path : dropped)
+            if (path.compare(0, folder.size() + 1, folder + "/") == 0)
+            {
+                const std::string name = path.substr(folder.size() + 1);
+                expectedKept.insert(name + ".eps");
+                expectedOutput.insert(name + ".ps");
+                expectedOutput.insert(name + ".ps.Folder.cfg");
+            }
+        const std::vector<std::string> kept = ListDirectory(Kept(folder));
+        const std::vector<std::string> outputs = AllEntries(folder + "/Output");
+        // Same sets: nothing lost, no "(2)" copies, no staged leftovers.
+        EXPECT_EQ(std::set<std::string>(kept.begin(), kept.end()), expectedKept) << folder;
+        EXPECT_EQ(std::set<std::string>(outputs.begin(), outputs.end()), expectedOutput) << folder;
+        for (const std::string& name : outputs)
+        {
+            if (EndsWith(name, ".ps"))
+            {
+                EXPECT_TRUE(EndsWith(ReadFile(folder + "/Output/" + name), kTrailer)) << name;
+            }
+        }
+        EXPECT_EQ(AllEntries(Work(folder)), std::vector<std::string>()) << folder;
+        EXPECT_EQ(ListDirectory(Failed(folder)), std::vector<std::string>()) << folder;
+    }
+}

@@ -1,0 +1,241 @@
+// The service's folders: how files arrive, several folders each by its own
+// settings, the list changing while it serves, bad input, status and stop,
+// and the systemd unit.
+#include <sys/file.h>
+
+#include "ServiceTestSupport.h"
+
+using namespace service_test;
+
+namespace
+{
+std::string Now()
+{
+    char text[32];
+    const time_t now = time(nullptr);
+    struct tm local;
+    strftime(text, sizeof(text), "%Y-%m-%d %H:%M:%S", localtime_r(&now, &local));
+    return text;
+}
+
+void WriteSome(int fd, const std::string& bytes)
+{
+    ASSERT_EQ(write(fd, bytes.data(), bytes.size()), static_cast<ssize_t>(bytes.size()));
+}
+} // namespace
+
+TEST_F(ServiceTest, EveryWayOfArrivingIsTakenOnceAndWhole)
+{
+    const std::string folder = MakeFolder("hot");
+    auto host = Serve(1);
+    const std::string half = label.substr(0, label.size() / 2), rest = label.substr(half.size());
+    const auto stillWaiting = [&](const std::string& path)
+    {
+        std::this_thread::sleep_for(std::chrono::milliseconds(500)); // > settle time
+        EXPECT_TRUE(Exists(path)) << path << " was taken while open for writing";
+    };
+    for (const std::string& line : DataLines("arrivals.txt"))
+    {
+        const std::string way = line.substr(0, line.find(' '));
+        const std::string path = folder + "/" + way + ".eps";
+        const std::string outside = scratch + "/" + way + ".eps";
+        if (way == "cp" || way == "rename" || way == "link")
+            WriteFile(outside, label);
+        if (way == "cp")
+            ASSERT_EQ(hf_test::RunProgram({"cp", outside, path}).exitCode, 0);
+        else if (way == "rename")
+            ASSERT_EQ(rename(outside.c_str(), path.c_str()), 0);
+        else if (way == "link")
+            ASSERT_EQ(link(outside.c_str(), path.c_str()), 0);
+        else if (way == "two-writers")
+        {
+            int first = open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL, 0644);
+            WriteSome(first, half);
+            int second = open(path.c_str(), O_WRONLY | O_APPEND);
+            close(first);
+            stillWaiting(path);
+            WriteSome(second, rest);
+            close(second);
+        }
+        else if (way == "slow")
+        {
+            int fd = open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL, 0644);
+            for (size_t at = 0; at < label.size(); at += label.size() / 3 + 1)
+            {
+                WriteSome(fd, label.substr(at, label.size() / 3 + 1));
+                stillWaiting(path);
+            }
+            close(fd);
+        }
+        const std::string output = folder + "/Output/" + way + ".ps";
+        ASSERT_TRUE(WaitFor([&] { return Exists(output) && !Exists(path); }, 10000)) << line << "\n"
+                                                                                     << host->Err();
+        // The whole EPS program went into the job: its last line is in the output.
+        const std::string body = label.substr(0, label.find_last_not_of("\r\n") + 1);
+        const std::string lastLine = body.substr(body.find_last_of("\r\n") + 1);
+        EXPECT_NE(ReadFile(output).find(lastLine), std::string::npos) << line;
+        EXPECT_EQ(ReadFile(Kept(folder) + "/" + way + ".eps"), label) << line;
+    }
+    EXPECT_EQ(ListDirectory(folder + "/Output").size(), 2 * DataLines("arrivals.txt").size());
+    EXPECT_EQ(Count(host->Err(), "<3>"), 0u) << host->Err();
+}
+
+TEST_F(ServiceTest, EachFolderByItsOwnSettingsAsTheListChanges)
+{
+    const std::vector<std::pair<std::string, std::string>> papers = {
+        {"a4", "A4"}, {"letter", "Letter"}, {"a3", "A3"}};
+    for (const auto& paper : papers)
+        MakeFolder(paper.first, paper.second);
+    const std::string broken = MakeFolder("broken");
+    WriteFile(Container(broken) + "/Folder.cfg", "not a configuration");
+    auto host = Serve(papers.size());
+    EXPECT_NE(host->Err().find("<3>cannot serve " + broken), std::string::npos) << host->Err();
+
+    for (const auto& paper : papers)
+        for (int i = 0; i < 5; ++i)
+            WriteFile(scratch + "/" + paper.first + "/" + std::to_string(i) + ".eps", label);
+    for (const auto& paper : papers)
+    {
+        const std::string output = scratch + "/" + paper.first + "/Output/";
+        ASSERT_TRUE(WaitFor([&] { return ListDirectory(output).size() == 10; }, 10000))
+            << paper.first << "\n"
+            << host->Err();
+        for (int i = 0; i < 5; ++i)
+            EXPECT_NE(ReadFile(output + std::to_string(i) + ".ps.Folder.cfg")
+                          .find("Value=\"" + paper.second + "\""),
+                      std::string::npos)
+                << paper.first;
+    }
+
+    // Added while serving: picked up. Removed: no longer watched.
+    const std::string added = MakeFolder("added");
+    ASSERT_TRUE(WaitFor([&] { return Count(host->Err(), "<6>serving " + added) >= 1; }, 10000));
+    std::this_thread::sleep_for(std::chrono::milliseconds(300)); // its settings, made after init
+    WriteFile(added + "/new.eps", label);
+    EXPECT_TRUE(WaitFor([&] { return Exists(added + "/Output/new.ps"); }, 10000)) << host->Err();
+    EXPECT_EQ(Host({"remove", scratch + "/a4"}).exitCode, 0);
+    ASSERT_TRUE(WaitFor([&] { return Count(host->Err(), "no longer serving") == 1; }, 10000));
+    WriteFile(scratch + "/a4/late.eps", label);
+    std::this_thread::sleep_for(std::chrono::milliseconds(600));
+    EXPECT_TRUE(Exists(scratch + "/a4/late.eps"));
+}
+
+TEST_F(ServiceTest, BadInputIsReportedAndTheOthersGoOn)
+{
+    const std::string good = MakeFolder("good");
+    const std::string doomed = MakeFolder("doomed");
+    std::string list = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<HotFolderList>\n";
+    for (const std::string& path :
+         {good, doomed, scratch + "/plain-file", scratch + "/loop", scratch + "/broken"})
+        list += "  <HotFolder path=\"" + path + "\"/>\n";
+    WriteFile(scratch + "/plain-file", "x");
+    ASSERT_EQ(symlink((scratch + "/loop").c_str(), (scratch + "/loop").c_str()), 0);
+    const std::string broken = MakeFolder("broken");
+    WriteFile(Container(broken) + "/Folder.cfg", "<HotFolder");
+    WriteFile(Warehouse() + "/HotFolderList.cfg", list + "</HotFolderList>\n");
+
+    auto host = Serve(2);
+    for (const std::string& line : DataLines("bad-input.txt"))
+    {
+        const std::string kind = line.substr(0, line.find(' '));
+        if (kind == "list-file" || kind == "symlink-loop" || kind == "broken-config")
+        {
+            const std::string path = scratch + (kind == "list-file"      ? "/plain-file"
+                                                : kind == "symlink-loop" ? "/loop"
+                                                                         : "/broken");
+            EXPECT_NE(host->Err().find("<3>cannot serve " + path), std::string::npos) << line;
+        }
+        else if (kind == "deleted")
+        {
+            nftw(doomed.c_str(), RemoveEntry, 16, FTW_DEPTH | FTW_PHYS);
+            EXPECT_TRUE(WaitFor(
+                [&] { return host->Err().find(doomed + " vanished") != std::string::npos; }, 5000))
+                << host->Err();
+        }
+        else if (kind == "fifo")
+            ASSERT_EQ(mkfifo((good + "/x.eps").c_str(), 0644), 0);
+        else if (kind == "vanishing")
+            for (int i = 0; i < 20; ++i)
+            {
+                const std::string path = good + "/gone" + std::to_string(i) + ".eps";
+                WriteFile(path, label);
+                unlink(path.c_str());
+            }
+        // The good folder is served after each.
+        const std::string probe = good + "/after-" + kind + ".eps";
+        WriteFile(probe, label);
+        EXPECT_TRUE(WaitFor([&] { return !Exists(probe); }, 5000)) << line << "\n" << host->Err();
+    }
+    EXPECT_TRUE(Exists(good + "/x.eps"));
+    EXPECT_EQ(host->Wait(0), -1) << "the service ended: " << host->Err();
+}
+
+TEST_F(ServiceTest, StatusRemoveAndStop)
+{
+    const std::string a4 = MakeFolder("a4");
+    const std::string letter = MakeFolder("letter", "Letter");
+    EXPECT_NE(Host({"status"}).out.find("not running"), std::string::npos);
+    {
+        auto host = Serve(2);
+        WriteFile(a4 + "/one.eps", label);
+        // What failed jobs leave: lines in the failure log, one of them old.
+        WriteFile(Failed(a4) + "/failed-jobs.log",
+                  "2001-01-01 10:00:00\told.eps\tInvalid input file (-1005)\n" + Now() +
+                      "\tbad.eps\tInvalid input file (-1005)\n");
+        ASSERT_TRUE(WaitFor([&] { return ListDirectory(Kept(a4)).size() == 1; }, 10000))
+            << host->Err();
+        hf_test::ProcessResult status = Host({"status", "--json"});
+        EXPECT_EQ(status.exitCode, 0);
+        for (const std::string& part : std::vector<std::string>{
+                 "\"running\": true", "\"path\": \"" + a4 + "\"",
+                 "\"server\": \"Example PostScript printer\"", "\"output_type\": \"PostScript\"",
+                 "\"page\": \"A4\"", "\"page\": \"Letter\"",
+                 "\"waiting\": 0, \"done_today\": 1, \"done_total\": 1, \"failed_today\": 1, "
+                 "\"failed_total\": 2",
+                 "\"last_failure\": \"bad.eps: Invalid input file (-1005)\""})
+            EXPECT_NE(status.out.find(part), std::string::npos) << part << "\n" << status.out;
+        // Killed, it leaves the marker but not the lock: not running.
+        host->Signal(SIGKILL);
+        host->Wait(5000);
+    }
+    EXPECT_TRUE(Exists(Warehouse() + "/Service/RunService"));
+    EXPECT_NE(Host({"status"}).out.find("Service:       not running"), std::string::npos);
+
+    auto host = Serve(2);
+    // StopHF pauses every folder until it goes.
+    WriteFile(Warehouse() + "/StopHF", "");
+    ASSERT_TRUE(WaitFor([&] { return host->Err().find("paused") != std::string::npos; }, 5000));
+    WriteFile(letter + "/held.eps", label);
+    std::this_thread::sleep_for(std::chrono::milliseconds(500));
+    EXPECT_TRUE(Exists(letter + "/held.eps"));
+    unlink((Warehouse() + "/StopHF").c_str());
+    EXPECT_TRUE(WaitFor([&] { return Exists(letter + "/Output/held.ps"); }, 5000)) << host->Err();
+    EXPECT_EQ(Host({"remove", letter}).exitCode, 0);
+    EXPECT_EQ(Host({"remove", letter}).exitCode, 3);
+    EXPECT_EQ(Host({"status", "--json"}).out.find(letter), std::string::npos);
+    EXPECT_TRUE(Exists(letter + "/" + kContainer)); // the folder stays
+    hf_test::ProcessResult stop = Host({"stop"});
+    EXPECT_EQ(stop.exitCode, 0) << stop.err;
+    EXPECT_EQ(host->Wait(5000), 0);
+    // SIGTERM ends it too (systemd's stop).
+    host = Serve(1);
+    host->Signal(SIGTERM);
+    EXPECT_EQ(host->Wait(5000), 0);
+    EXPECT_NE(Host({"serve", "--help"}).out.find("RunService"), std::string::npos);
+}
+
+TEST_F(ServiceTest, TheInstalledUnitVerifies)
+{
+    if (hf_test::RunProgram({"systemd-analyze", "--version"}).exitCode != 0)
+        GTEST_SKIP() << "systemd-analyze is not installed; the unit file is not verified";
+    const std::string prefix = scratch + "/installed";
+    hf_test::ProcessResult install =
+        hf_test::RunProgram({HF_CMAKE_COMMAND, "--install", HF_BUILD_DIR, "--prefix", prefix});
+    ASSERT_EQ(install.exitCode, 0) << install.err;
+    const std::string unit = prefix + "/lib/systemd/system/hotfolder.service";
+    EXPECT_NE(ReadFile(unit).find("ExecStart=" + prefix + "/bin/hotfolder serve"),
+              std::string::npos);
+    hf_test::ProcessResult verify = hf_test::RunProgram({"systemd-analyze", "verify", unit});
+    EXPECT_EQ(verify.exitCode, 0) << verify.out << verify.err;
+    EXPECT_EQ(verify.err, "");
+}
