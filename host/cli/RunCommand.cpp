@@ -115,15 +115,14 @@ bool FolderRun::Pass(const std::vector<wxString>& candidates)
 {
     if (candidates.empty())
         return true;
-    FolderContent content;
+    wxArrayString files;
     for (const wxString& path : candidates)
-        content.m_arrFiles.Add(path);
-    FolderContent* contentPointer = &content;
+        files.Add(path);
     wxArrayString rejected;
     JobInfoCollection jobs;
     {
         ScopedSeconds timing(m_statistics.sniffSeconds);
-        m_session.Filter().SniffFolder(m_folder.GetFolder(), rejected, jobs, contentPointer);
+        m_session.SniffListed(m_folder.GetFolder(), files, rejected, jobs);
     }
     // Refused: everything offered that no job took, whether the filter
     // listed it as rejected or silently passed it over.

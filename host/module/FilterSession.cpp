@@ -91,3 +91,12 @@ std::unique_ptr<wxXmlNode> MakeDefaultFilterNode(const wxString& modulePath, wxS
     }
     return filter;
 }
+
+void FilterSession::SniffListed(const wxString& folder, const wxArrayString& files,
+                                wxArrayString& rejected, JobInfoCollection& jobs)
+{
+    FolderContent content;
+    content.m_arrFiles = files;
+    FolderContent* contentPointer = &content;
+    m_plugin->SniffFolder(folder, rejected, jobs, contentPointer);
+}

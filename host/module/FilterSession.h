@@ -25,6 +25,10 @@ public:
     const FilterModule& Module() const { return *m_module; }
     // The filter's own text for a status code, with the code appended.
     wxString DescribeStatus(long code);
+    // Sniffs exactly the listed files of folder (not the whole folder), as a
+    // host does for files it has seen arrive.
+    void SniffListed(const wxString& folder, const wxArrayString& files, wxArrayString& rejected,
+                     JobInfoCollection& jobs);
     // A filter keeps its last status and answers it for later jobs too, so
     // after a failed job it is initialised again (which clears the status).
     void ClearStatusAfterFailure();

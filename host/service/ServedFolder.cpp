@@ -116,15 +116,14 @@ size_t ServedFolder::TakeOffered(size_t limit, const std::function<bool()>& stop
     if (candidates.empty())
         return 0;
 
-    FolderContent content;
+    wxArrayString files;
     for (const auto& candidate : candidates)
-        content.m_arrFiles.Add(candidate.second);
-    FolderContent* contentPointer = &content;
+        files.Add(candidate.second);
     wxArrayString rejected;
     JobInfoCollection jobs;
     {
         ScopedSeconds timing(m_statistics.sniffSeconds);
-        m_session->Filter().SniffFolder(Path(), rejected, jobs, contentPointer);
+        m_session->SniffListed(Path(), files, rejected, jobs);
     }
     std::set<wxString> taken;
     for (size_t i = 0; i < jobs.size(); ++i)

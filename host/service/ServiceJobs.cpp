@@ -437,13 +437,12 @@ void ServiceJobs::Recover()
             Deliver(entry, name, jobName);
         else
         {
-            FolderContent content;
+            wxArrayString files;
             for (const wxString& file : originals)
-                content.m_arrFiles.Add(file);
-            FolderContent* contentPointer = &content;
+                files.Add(file);
             wxArrayString rejected;
             JobInfoCollection jobs;
-            m_session.Filter().SniffFolder(m_hotFolder, rejected, jobs, contentPointer);
+            m_session.SniffListed(m_hotFolder, files, rejected, jobs);
             if (jobs.empty())
                 Fail(entry, jobName, "the filter no longer accepts it");
             else
