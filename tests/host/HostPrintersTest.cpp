@@ -1,10 +1,7 @@
 // Folders bound to CUPS queues by name (init --printer) and the list of
 // queues (printers), against a scheduler of the test's own.
-#include <memory>
-
-#include "HostTestSupport.h"
 #include "PpdSources.h"
-#include "PrivateCupsd.h"
+#include "SchedulerFixture.h"
 
 using namespace host_test;
 
@@ -12,35 +9,22 @@ namespace
 {
 const char* const kPdfPpd = "/usr/share/ppd/cupsfilters/HP-Color_LaserJet_CM3530_MFP-PDF.ppd";
 
-class HostPrinters : public HostTest
+class HostPrinters : public HostWithScheduler
 {
 protected:
     void SetUp() override
     {
-        HostTest::SetUp();
-        if (!cups_test::PrivateCupsd::Installed())
-            GTEST_SKIP() << "cupsd or lpadmin missing (packages cups-daemon, cups-client)";
-        ASSERT_EQ(chmod(scratch.c_str(), 0755), 0);
-        const std::string root = scratch + "/cups";
-        ASSERT_EQ(mkdir(root.c_str(), 0755), 0);
-        scheduler = std::make_unique<cups_test::PrivateCupsd>(root);
+        HostWithScheduler::SetUp();
+        if (!Ready())
+            return;
         std::string problem;
-        ASSERT_TRUE(scheduler->Start(problem)) << problem;
         ASSERT_TRUE(scheduler->AddFileQueue("ps_queue", ppd_sources::TestPpd(), scratch + "/ps.out",
                                             problem))
             << problem;
         hasPdfQueue = access(kPdfPpd, R_OK) == 0 &&
                       scheduler->AddFileQueue("pdf_queue", kPdfPpd, scratch + "/pdf.out", problem);
-        setenv("CUPS_SERVER", scheduler->Server().c_str(), 1);
-    }
-    void TearDown() override
-    {
-        unsetenv("CUPS_SERVER");
-        scheduler.reset();
-        HostTest::TearDown();
     }
 
-    std::unique_ptr<cups_test::PrivateCupsd> scheduler;
     bool hasPdfQueue = false;
 };
 } // namespace

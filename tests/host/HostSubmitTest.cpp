@@ -1,11 +1,8 @@
 // run --submit cups:QUEUE against a CUPS scheduler of the test's own: the
 // delivered output reaches the queue's device on the job's paper, and a
 // queue that refuses leaves the output delivered and fails the run.
-#include <memory>
-
-#include "HostTestSupport.h"
 #include "PpdSources.h"
-#include "PrivateCupsd.h"
+#include "SchedulerFixture.h"
 
 using namespace host_test;
 
@@ -14,35 +11,20 @@ namespace
 const char* const kQueue = "hotfolder_run";
 const char* const kFilter = "/usr/lib/cups/filter/pstops";
 
-class HostSubmit : public HostTest
+class HostSubmit : public HostWithScheduler
 {
 protected:
     void SetUp() override
     {
-        HostTest::SetUp();
-        if (!cups_test::PrivateCupsd::Installed())
-            GTEST_SKIP() << "cupsd or lpadmin missing (packages cups-daemon, cups-client)";
+        HostWithScheduler::SetUp();
+        if (!Ready())
+            return;
         if (access(kFilter, X_OK) != 0)
             GTEST_SKIP() << kFilter << " missing (package cups-core-drivers)";
-        // The queue's filters run as the print user and must reach the spool
-        // and the device file below the scratch directory.
-        ASSERT_EQ(chmod(scratch.c_str(), 0755), 0);
-        const std::string root = scratch + "/cups";
-        ASSERT_EQ(mkdir(root.c_str(), 0755), 0);
-        scheduler = std::make_unique<cups_test::PrivateCupsd>(root);
         std::string problem;
-        ASSERT_TRUE(scheduler->Start(problem)) << problem;
         device = scratch + "/device.ps";
         ASSERT_TRUE(scheduler->AddFileQueue(kQueue, ppd_sources::TestPpd(), device, problem))
             << problem;
-        // The host is a CUPS client like any other: it finds the scheduler here.
-        setenv("CUPS_SERVER", scheduler->Server().c_str(), 1);
-    }
-    void TearDown() override
-    {
-        unsetenv("CUPS_SERVER");
-        scheduler.reset();
-        HostTest::TearDown();
     }
 
     // A hot folder bound to the queue's printer, converting on paper.
@@ -57,7 +39,6 @@ protected:
         return folder;
     }
 
-    std::unique_ptr<cups_test::PrivateCupsd> scheduler;
     std::string device;
 };
 } // namespace
