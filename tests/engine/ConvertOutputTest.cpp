@@ -67,7 +67,7 @@ protected:
         else
             EXPECT_EQ(converted, 1);
         EXPECT_TRUE(TakeFingerprint(input) == before) << "input changed";
-        const std::string bytes = ReadWholeFile(output);
+        const std::string bytes = testkit::ReadFile(output);
         ExpectCrLfOutsideDocument(bytes, eps);
         return bytes;
     }
@@ -78,7 +78,7 @@ protected:
         const std::string path = kGoldenDir + goldenName;
         if (std::getenv("HF_UPDATE_GOLDEN"))
             WriteBytes(path, masked);
-        EXPECT_EQ(masked, ReadWholeFile(path)) << "differs from " << path;
+        EXPECT_EQ(masked, testkit::ReadFile(path)) << "differs from " << path;
     }
 
     ScratchDir scratch;
@@ -252,7 +252,7 @@ TEST_F(ConvertOutput_, ShortCopyStillEndsWithTheTrailer)
     EXPECT_EQ(result, 1);
     EXPECT_EQ(messages, "Premature EOF with leftover BytesToRead = " +
                             std::to_string(5000 - body.size()) + "\n");
-    const std::string out = ReadWholeFile(scratch.File("out.ps"));
+    const std::string out = testkit::ReadFile(scratch.File("out.ps"));
     const std::string trailer = "%%EndDocument\r\ncount @ST_count sub\r\n{ pop }\r\nrepeat\r\n"
                                 "countdictstack @ST_countdictstack sub\r\n{ end }\r\nrepeat\r\n"
                                 "@ST_save\r\nend\r\nrestore\r\nshowpage\r\n%%Trailer\r\n%%EOF\r\n";

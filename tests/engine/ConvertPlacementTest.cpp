@@ -246,7 +246,7 @@ std::vector<Case> Grid()
 
 TEST(ConvertPlacement, GhostscriptSeesThePictureWhereTheRulesPutIt)
 {
-    if (!ProgramAvailable("gs"))
+    if (!testkit::ProgramAvailable("gs"))
         GTEST_SKIP() << "Ghostscript (gs) not installed";
     ScratchDir scratch;
     for (const Case& c : Grid())
@@ -291,7 +291,7 @@ TEST(ConvertPlacement, GhostscriptSeesThePictureWhereTheRulesPutIt)
 
 TEST(ConvertPlacement, EmbeddedProgramCannotDisturbTheJob)
 {
-    if (!ProgramAvailable("gs"))
+    if (!testkit::ProgramAvailable("gs"))
         GTEST_SKIP() << "Ghostscript (gs) not installed";
     // An EPS that calls showpage, leaves operands and an open dictionary
     // behind: the wrapper must still print exactly one page without error.

@@ -90,7 +90,7 @@ private:
         close(m_saved);
         m_saved = -1;
         close(m_fd);
-        m_text = ReadWholeFile(m_name);
+        m_text = testkit::ReadFile(m_name);
         unlink(m_name.c_str());
     }
     int m_fd = -1;
@@ -122,7 +122,7 @@ inline Fingerprint TakeFingerprint(const std::string& path)
     if (S_ISREG(info.st_mode))
     {
         unsigned long long hash = 1469598103934665603ULL; // FNV-1a
-        for (unsigned char c : ReadWholeFile(path))
+        for (unsigned char c : testkit::ReadFile(path))
             hash = (hash ^ c) * 1099511628211ULL;
         print.hash = hash;
     }

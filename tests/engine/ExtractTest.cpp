@@ -47,7 +47,7 @@ protected:
         Copy copy;
         copy.messages = Messages(fopen(scratch.File("in.bin").c_str(), "rb"),
                                  fopen(scratch.File("out.bin").c_str(), "wb"), offset, length);
-        copy.output = ReadWholeFile(scratch.File("out.bin"));
+        copy.output = testkit::ReadFile(scratch.File("out.bin"));
         return copy;
     }
     ScratchDir scratch;

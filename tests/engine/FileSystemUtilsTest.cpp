@@ -143,8 +143,8 @@ TEST(FileSystemUtils, LinksAreRemovedButNeverFollowed)
 
     DeleteFolderChildren(root.c_str());
     EXPECT_FALSE(Exists(root));
-    EXPECT_EQ(ReadWholeFile(outside), "keep me");
-    EXPECT_EQ(ReadWholeFile(outsideDir + "/keep.txt"), "keep");
+    EXPECT_EQ(testkit::ReadFile(outside), "keep me");
+    EXPECT_EQ(testkit::ReadFile(outsideDir + "/keep.txt"), "keep");
 }
 
 TEST(FileSystemUtils, ShellCharactersInNamesAreJustCharacters)

@@ -56,7 +56,7 @@ std::string BaseName(const std::string& path)
 
 TEST(RealArtwork, ConvertsAndRendersWithoutError)
 {
-    if (!ProgramAvailable("gs"))
+    if (!testkit::ProgramAvailable("gs"))
         GTEST_SKIP() << "Ghostscript (gs) not installed";
     const std::vector<std::string> artwork = InstalledArtwork();
     if (artwork.empty())
@@ -95,7 +95,7 @@ TEST(RealArtwork, ConvertsAndRendersWithoutError)
 
 TEST(RealArtwork, DosBinaryFromEpstoolGivesThePostScriptSectionOnly)
 {
-    if (!ProgramAvailable("gs") || !ProgramAvailable("epstool"))
+    if (!testkit::ProgramAvailable("gs") || !testkit::ProgramAvailable("epstool"))
         GTEST_SKIP() << "needs Ghostscript (gs) and epstool";
     const std::vector<std::string> artwork = InstalledArtwork();
     if (artwork.empty())
@@ -105,10 +105,10 @@ TEST(RealArtwork, DosBinaryFromEpstoolGivesThePostScriptSectionOnly)
     {
         SCOPED_TRACE(eps);
         const std::string wrapped = scratch.File(BaseName(eps) + ".dos.eps");
-        const ProcessResult made =
-            RunProgram({"epstool", "--add-tiff-preview", "--device", "tiffg3", eps, wrapped});
+        const testkit::ProcessResult made =
+            testkit::RunProgram({"epstool", "--add-tiff-preview", "--device", "tiffg3", eps, wrapped});
         ASSERT_EQ(made.exitCode, 0) << made.err;
-        const std::string dosBytes = ReadWholeFile(wrapped);
+        const std::string dosBytes = testkit::ReadFile(wrapped);
         ASSERT_GE(dosBytes.size(), 30u);
         ASSERT_EQ(dosBytes.compare(0, 4, "\xC5\xD0\xD3\xC6"), 0) << "epstool made no DOS EPS";
 
@@ -122,7 +122,7 @@ TEST(RealArtwork, DosBinaryFromEpstoolGivesThePostScriptSectionOnly)
         ASSERT_EQ(ConvertEPStoPS(&context, &a4, fromDos.c_str()), 1);
 
         // Exactly the PostScript section between the wrapper's parts.
-        const std::string out = ReadWholeFile(fromDos);
+        const std::string out = testkit::ReadFile(fromDos);
         const size_t begin = out.find("%%BeginDocument:");
         ASSERT_NE(begin, std::string::npos);
         const size_t body = out.find("\r\n", begin) + 2;

@@ -49,10 +49,10 @@ TEST_F(Host, FolderOfMixedFilesToPlacedPages)
     sample::WriteFile(hot.File("plain.eps"), artwork);
     sample::WriteFile(hot.File("binary.eps"),
                       sample::DosEpsBinary(artwork, std::string(5000, '\x7f')));
-    if (ProgramAvailable("epstool"))
+    if (testkit::ProgramAvailable("epstool"))
     {
         const auto made =
-            RunProgram({"epstool", "--add-tiff-preview", "--device", "tiffg3",
+            testkit::RunProgram({"epstool", "--add-tiff-preview", "--device", "tiffg3",
                         hot.File("plain.eps").ToStdString(), hot.File("tool.eps").ToStdString()});
         ASSERT_EQ(made.exitCode, 0) << made.err;
     }
@@ -94,7 +94,7 @@ TEST_F(Host, FolderOfMixedFilesToPlacedPages)
     ASSERT_EQ(plugin->SniffFolder(hot.Path(), rejected, jobs), 0);
     ASSERT_EQ(rejected.size(), 1u);
     EXPECT_EQ(wxFileName(rejected[0]).GetFullName(), "notes.txt");
-    const size_t expectedJobs = ProgramAvailable("epstool") ? 3u : 2u;
+    const size_t expectedJobs = testkit::ProgramAvailable("epstool") ? 3u : 2u;
     ASSERT_EQ(jobs.GetCount(), expectedJobs);
 
     for (size_t i = 0; i < jobs.GetCount(); ++i)
@@ -110,7 +110,7 @@ TEST_F(Host, FolderOfMixedFilesToPlacedPages)
         EXPECT_EQ(outputName, wxFileName(input).GetName() + ".ps");
 
         const std::string ps = out.File(outputName).ToStdString();
-        const std::string bytes = ReadWholeFile(ps);
+        const std::string bytes = testkit::ReadFile(ps);
         EXPECT_EQ(bytes.find("\x7f\x7f\x7f"), std::string::npos) << "preview bytes copied";
         const GhostscriptReport gs = RunGhostscriptBBox(ps);
         EXPECT_FALSE(gs.postscriptError) << gs.process.err;

@@ -12,7 +12,7 @@
 TEST(ExportedSymbols, ExactlyTheEntryPoints)
 {
     const std::string table =
-        hf_test::RunProgram({"nm", "-D", "--defined-only", HF_MODULE_PATH}).out;
+        testkit::RunProgram({"nm", "-D", "--defined-only", HF_MODULE_PATH}).out;
     ASSERT_FALSE(table.empty()) << "nm printed nothing for " << HF_MODULE_PATH;
     std::set<std::string> exported;
     std::istringstream lines(table);

@@ -5,7 +5,7 @@ using namespace host_test;
 
 TEST_F(HostTest, InfoShowsTheModuleAndEveryStatusText)
 {
-    hf_test::ProcessResult info = Host({"info"});
+    testkit::ProcessResult info = Host({"info"});
     ASSERT_EQ(info.exitCode, 0) << info.err;
     for (const char* line :
          {"Identifier:                Orv.EPS.1", "Extensions:                .eps",
@@ -14,7 +14,7 @@ TEST_F(HostTest, InfoShowsTheModuleAndEveryStatusText)
           "    1032  Error: CSL library error during conversion"})
         EXPECT_NE(info.out.find(line), std::string::npos) << line << "\n" << info.out;
 
-    hf_test::ProcessResult broken = Host({"info", "--module", HF_BAD_MODULE});
+    testkit::ProcessResult broken = Host({"info", "--module", HF_BAD_MODULE});
     EXPECT_EQ(broken.exitCode, 3);
     EXPECT_NE(broken.err.find("lacks the entry point GetPluginInstance"), std::string::npos);
 }
@@ -22,7 +22,7 @@ TEST_F(HostTest, InfoShowsTheModuleAndEveryStatusText)
 TEST_F(HostTest, InitMakesTheContainerAndListsTheFolderOnce)
 {
     std::string folder = scratch + "/hot";
-    hf_test::ProcessResult init = Host({"init", folder, "--server", kServer, "--name", "Posters"});
+    testkit::ProcessResult init = Host({"init", folder, "--server", kServer, "--name", "Posters"});
     ASSERT_EQ(init.exitCode, 0) << init.err;
     std::string config = ReadFile(Container(folder) + "/Folder.cfg");
     EXPECT_NE(config.find("<HotFolder name=\"Posters\""), std::string::npos);
@@ -33,7 +33,7 @@ TEST_F(HostTest, InitMakesTheContainerAndListsTheFolderOnce)
     EXPECT_NE(config.find("<OUTPUTFILETYPEEPS>1</OUTPUTFILETYPEEPS>"), std::string::npos);
     EXPECT_EQ(ReadFile(Container(folder) + "/ServerDescription.xml"), ReadFile(kServer));
 
-    hf_test::ProcessResult again = Host({"init", folder});
+    testkit::ProcessResult again = Host({"init", folder});
     EXPECT_EQ(again.exitCode, 3);
     EXPECT_NE(again.err.find("is a hot folder already"), std::string::npos);
     std::string list = ReadFile(Warehouse() + "/HotFolderList.cfg");
@@ -41,7 +41,7 @@ TEST_F(HostTest, InitMakesTheContainerAndListsTheFolderOnce)
     EXPECT_NE(list.find("path=\"" + folder + "\""), std::string::npos) << list;
 
     WriteFile(scratch + "/broken.xml", "<ServerDescription>");
-    hf_test::ProcessResult bad =
+    testkit::ProcessResult bad =
         Host({"init", scratch + "/other", "--server", scratch + "/broken.xml"});
     EXPECT_EQ(bad.exitCode, 3);
     EXPECT_FALSE(Exists(Container(scratch + "/other") + "/Folder.cfg"));
@@ -69,7 +69,7 @@ TEST_F(HostTest, SettingsSetChecksEveryValueBeforeChangingAnything)
     {
         std::vector<std::string> args = {"settings", folder, "--set"};
         args.insert(args.end(), attempt.assignments.begin(), attempt.assignments.end());
-        hf_test::ProcessResult set = Host(args);
+        testkit::ProcessResult set = Host(args);
         EXPECT_EQ(set.exitCode, 2) << attempt.message;
         EXPECT_NE(set.err.find(attempt.message), std::string::npos) << set.err;
     }
@@ -95,7 +95,7 @@ TEST_F(HostTest, SettingsWindowEmbedsThePanelAndOkSavesThroughTheFilter)
     if (!std::getenv("DISPLAY"))
         GTEST_SKIP() << "needs a display (the suite runs under xvfb-run)";
     std::string folder = MakePostScriptFolder("Legal");
-    hf_test::ProcessResult accept = Host({"settings", folder, "--accept"});
+    testkit::ProcessResult accept = Host({"settings", folder, "--accept"});
     ASSERT_EQ(accept.exitCode, 0) << accept.err;
     EXPECT_NE(accept.out.find("saved"), std::string::npos);
     // What the panel loaded it saved back; the folder still converts on Legal.
@@ -108,7 +108,7 @@ TEST_F(HostTest, SettingsWindowEmbedsThePanelAndOkSavesThroughTheFilter)
 TEST_F(HostTest, ConvertWritesOnePostScriptFileOnTheChosenPaper)
 {
     WriteFile(scratch + "/banner.eps", ReadFile(kExamples + "/eps/banner-landscape.eps"));
-    hf_test::ProcessResult convert =
+    testkit::ProcessResult convert =
         Host({"convert", scratch + "/banner.eps", "-o", scratch + "/out/banner.ps", "--server",
               kServer, "--set", "DEFAULTPAGESIZE=Tabloid", "IMAGEPOSITION=Bottom Left"});
     ASSERT_NE(convert.exitCode, 0) << "the output folder does not exist yet";
@@ -136,7 +136,7 @@ TEST_F(HostTest, ConvertWritesOnePostScriptFileOnTheChosenPaper)
 TEST_F(HostTest, ConvertRefusesWhatTheFilterDoesNotAccept)
 {
     WriteFile(scratch + "/list.eps", ReadFile(kExamples + "/eps/not-really.eps"));
-    hf_test::ProcessResult convert = Host({"convert", scratch + "/list.eps"});
+    testkit::ProcessResult convert = Host({"convert", scratch + "/list.eps"});
     EXPECT_EQ(convert.exitCode, 1);
     EXPECT_NE(convert.err.find("is not a file the EPS filter accepts"), std::string::npos);
     EXPECT_EQ(ListDirectory(scratch), std::vector<std::string>{"list.eps"});
@@ -152,7 +152,7 @@ TEST_F(HostTest, RunRefusesASubmitTargetThatIsNoCupsQueue)
     CopyExample("label.eps", folder);
     for (const char* target : {"lp:office", "cups:", "cups:two words", "cups:a/b", "office"})
     {
-        hf_test::ProcessResult run = Host({"run", folder, "--submit", target});
+        testkit::ProcessResult run = Host({"run", folder, "--submit", target});
         EXPECT_EQ(run.exitCode, 2) << target;
         EXPECT_NE(run.err.find("cups:QUEUE"), std::string::npos) << run.err;
     }

@@ -26,7 +26,7 @@ protected:
     // The run refused to start: status 3, one message, the input untouched.
     void ExpectRefusedRun(const std::vector<std::string>& args, const std::string& message)
     {
-        hf_test::ProcessResult run = Host(args);
+        testkit::ProcessResult run = Host(args);
         EXPECT_EQ(run.exitCode, 3) << run.err;
         EXPECT_NE(run.err.find(message), std::string::npos) << run.err;
         EXPECT_EQ(CountLines(run.err), 1) << run.err;
@@ -85,12 +85,12 @@ TEST_F(HostFailureTest, AnOutputDirectoryThatCannotBeWritten)
 
 TEST_F(HostFailureTest, ABadCommandLineIsAUsageError)
 {
-    hf_test::ProcessResult run = Host({"run", folder, "--bogus"});
+    testkit::ProcessResult run = Host({"run", folder, "--bogus"});
     EXPECT_EQ(run.exitCode, 2);
     EXPECT_NE(run.err.find("unknown option --bogus"), std::string::npos);
     EXPECT_EQ(Host({"frobnicate"}).exitCode, 2);
     EXPECT_EQ(Host({"run", folder, "--settle", "soon"}).exitCode, 2);
-    hf_test::ProcessResult intoItself = Host({"run", folder, "--out", folder + "/"});
+    testkit::ProcessResult intoItself = Host({"run", folder, "--out", folder + "/"});
     EXPECT_EQ(intoItself.exitCode, 2);
     EXPECT_NE(intoItself.err.find("cannot be the hot folder itself"), std::string::npos);
     EXPECT_EQ(ReadFile(folder + "/label.eps"), original);

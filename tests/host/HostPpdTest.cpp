@@ -24,7 +24,7 @@ std::vector<std::string> PaperNames(const std::string& xml)
 TEST_F(HostTest, ServerFromPpdWritesThePapersOfThePrinter)
 {
     const std::string xml = scratch + "/server.xml";
-    hf_test::ProcessResult made = Host({"server-from-ppd", ppd_sources::TestPpd(), "-o", xml});
+    testkit::ProcessResult made = Host({"server-from-ppd", ppd_sources::TestPpd(), "-o", xml});
     ASSERT_EQ(made.exitCode, 0) << made.err;
     const std::string written = ReadFile(xml);
     EXPECT_EQ(PaperNames(written), (std::vector<std::string>{"Letter", "A4", "Postcard", "Tab"}));
@@ -39,16 +39,16 @@ TEST_F(HostTest, ServerFromPpdWritesThePapersOfThePrinter)
     EXPECT_EQ(defaultPaper.PaperName, "A4");
 
     // Without -o the same description goes to standard output.
-    hf_test::ProcessResult printed = Host({"server-from-ppd", ppd_sources::TestPpd()});
+    testkit::ProcessResult printed = Host({"server-from-ppd", ppd_sources::TestPpd()});
     EXPECT_EQ(printed.exitCode, 0) << printed.err;
     EXPECT_EQ(printed.out, written);
 
-    hf_test::ProcessResult help = Host({"server-from-ppd", "--help"});
+    testkit::ProcessResult help = Host({"server-from-ppd", "--help"});
     EXPECT_EQ(help.exitCode, 0);
     EXPECT_NE(help.out.find("server-from-ppd FILE.ppd"), std::string::npos) << help.out;
     EXPECT_NE(Host({"--help"}).out.find("server-from-ppd"), std::string::npos);
 
-    hf_test::ProcessResult missing = Host({"server-from-ppd", scratch + "/absent.ppd"});
+    testkit::ProcessResult missing = Host({"server-from-ppd", scratch + "/absent.ppd"});
     EXPECT_EQ(missing.exitCode, 3);
     EXPECT_FALSE(missing.err.empty());
     EXPECT_EQ(Host({"server-from-ppd"}).exitCode, 2);
@@ -57,25 +57,25 @@ TEST_F(HostTest, ServerFromPpdWritesThePapersOfThePrinter)
 TEST_F(HostTest, InitFromAPpdStoresItsDescriptionAndConvertsOnItsPaper)
 {
     const std::string folder = scratch + "/hot";
-    hf_test::ProcessResult init = Host({"init", folder, "--ppd", ppd_sources::TestPpd()});
+    testkit::ProcessResult init = Host({"init", folder, "--ppd", ppd_sources::TestPpd()});
     ASSERT_EQ(init.exitCode, 0) << init.err;
     EXPECT_NE(init.out.find("Server:         " + ppd_sources::TestPpd()), std::string::npos)
         << init.out;
 
     // The same description server-from-ppd writes, where --server puts it,
     // and the printer description itself beside it.
-    hf_test::ProcessResult made = Host({"server-from-ppd", ppd_sources::TestPpd()});
+    testkit::ProcessResult made = Host({"server-from-ppd", ppd_sources::TestPpd()});
     ASSERT_EQ(made.exitCode, 0);
     EXPECT_EQ(ReadFile(Container(folder) + "/ServerDescription.xml"), made.out);
     EXPECT_EQ(ReadFile(Container(folder) + "/server.ppd"), ReadFile(ppd_sources::TestPpd()));
 
     // "Tab" exists only in this printer's list: the settings and the run
     // both read the stored description.
-    hf_test::ProcessResult set = Host({"settings", folder, "--set", "OUTPUTFILETYPEEPS=0",
+    testkit::ProcessResult set = Host({"settings", folder, "--set", "OUTPUTFILETYPEEPS=0",
                                        "OUTPUTFILETYPEPS=1", "DEFAULTPAGESIZE=Tab"});
     ASSERT_EQ(set.exitCode, 0) << set.err;
     CopyExample("label.eps", folder);
-    hf_test::ProcessResult run = Host({"run", folder});
+    testkit::ProcessResult run = Host({"run", folder});
     ASSERT_EQ(run.exitCode, 0) << run.err;
     EXPECT_EQ(run.err.find("does not offer"), std::string::npos) << run.err;
     const std::string output = folder + "/Output/label.ps";
@@ -91,16 +91,16 @@ TEST_F(HostTest, InitFromAPpdStoresItsDescriptionAndConvertsOnItsPaper)
 TEST_F(HostTest, InitRefusesABadPpdAndTwoServerSources)
 {
     const std::string folder = scratch + "/hot";
-    hf_test::ProcessResult both =
+    testkit::ProcessResult both =
         Host({"init", folder, "--ppd", ppd_sources::TestPpd(), "--server", kServer});
     EXPECT_EQ(both.exitCode, 2);
     EXPECT_NE(both.err.find("--server and --ppd"), std::string::npos) << both.err;
 
     WriteFile(scratch + "/broken.ppd", "this is no printer description\n");
-    hf_test::ProcessResult broken = Host({"init", folder, "--ppd", scratch + "/broken.ppd"});
+    testkit::ProcessResult broken = Host({"init", folder, "--ppd", scratch + "/broken.ppd"});
     EXPECT_EQ(broken.exitCode, 3);
     EXPECT_FALSE(broken.err.empty());
-    hf_test::ProcessResult absent = Host({"init", folder, "--ppd", scratch + "/absent.ppd"});
+    testkit::ProcessResult absent = Host({"init", folder, "--ppd", scratch + "/absent.ppd"});
     EXPECT_EQ(absent.exitCode, 3);
     // Nothing was made for a refused init.
     EXPECT_FALSE(Exists(folder));

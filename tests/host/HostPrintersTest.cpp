@@ -32,7 +32,7 @@ protected:
 TEST_F(HostPrinters, InitBindsTheFolderAndRunPrintsThereWithoutSubmit)
 {
     const std::string folder = scratch + "/hot";
-    hf_test::ProcessResult init = Host({"init", folder, "--printer", "ps_queue"});
+    testkit::ProcessResult init = Host({"init", folder, "--printer", "ps_queue"});
     ASSERT_EQ(init.exitCode, 0) << init.err << scheduler->Log();
     EXPECT_NE(init.out.find("ps_queue"), std::string::npos) << init.out;
     EXPECT_EQ(ReadFile(Container(folder) + "/PrinterQueue.txt"), "ps_queue\n");
@@ -42,11 +42,11 @@ TEST_F(HostPrinters, InitBindsTheFolderAndRunPrintsThereWithoutSubmit)
     EXPECT_NE(server.find("/ImagingBBox null&gt;&gt;setpagedevice"), std::string::npos);
     EXPECT_NE(ReadFile(Container(folder) + "/server.ppd").find("*PageSize Tab"), std::string::npos);
 
-    hf_test::ProcessResult set = Host({"settings", folder, "--set", "OUTPUTFILETYPEEPS=0",
+    testkit::ProcessResult set = Host({"settings", folder, "--set", "OUTPUTFILETYPEEPS=0",
                                        "OUTPUTFILETYPEPS=1", "DEFAULTPAGESIZE=A4"});
     ASSERT_EQ(set.exitCode, 0) << set.err;
     CopyExample("label.eps", folder);
-    hf_test::ProcessResult run = Host({"run", folder});
+    testkit::ProcessResult run = Host({"run", folder});
     EXPECT_EQ(run.exitCode, 0) << run.err;
     EXPECT_NE(run.out.find("queued on ps_queue as CUPS job "), std::string::npos) << run.out;
     // --submit still names another queue.
@@ -65,7 +65,7 @@ TEST_F(HostPrinters, InitBindsTheFolderAndRunPrintsThereWithoutSubmit)
                   std::string::npos);
     }
 
-    hf_test::ProcessResult list = Host({"printers"});
+    testkit::ProcessResult list = Host({"printers"});
     ASSERT_EQ(list.exitCode, 0) << list.err;
     EXPECT_NE(list.out.find("Generic Test PostScript & Co      folder " + folder),
               std::string::npos)
@@ -80,21 +80,21 @@ TEST_F(HostPrinters, InitBindsTheFolderAndRunPrintsThereWithoutSubmit)
 TEST_F(HostPrinters, UnknownQueueAndStoppedSchedulerMakeNothing)
 {
     const std::string folder = scratch + "/hot";
-    hf_test::ProcessResult unknown = Host({"init", folder, "--printer", "no_such_queue"});
+    testkit::ProcessResult unknown = Host({"init", folder, "--printer", "no_such_queue"});
     EXPECT_EQ(unknown.exitCode, 3);
     EXPECT_NE(unknown.err.find("no queue \"no_such_queue\""), std::string::npos) << unknown.err;
     EXPECT_NE(unknown.err.find(scheduler->Server()), std::string::npos) << unknown.err;
     EXPECT_FALSE(Exists(folder));
 
     scheduler->Stop();
-    hf_test::ProcessResult stopped = Host({"init", folder, "--printer", "ps_queue"});
+    testkit::ProcessResult stopped = Host({"init", folder, "--printer", "ps_queue"});
     EXPECT_EQ(stopped.exitCode, 3);
     EXPECT_NE(stopped.err.find("cannot reach the CUPS scheduler at " + scheduler->Server()),
               std::string::npos)
         << stopped.err;
     EXPECT_NE(stopped.err.find("\"ps_queue\""), std::string::npos) << stopped.err;
     EXPECT_FALSE(Exists(folder));
-    hf_test::ProcessResult list = Host({"printers"});
+    testkit::ProcessResult list = Host({"printers"});
     EXPECT_EQ(list.exitCode, 3);
     EXPECT_NE(list.err.find(scheduler->Server()), std::string::npos) << list.err;
 }

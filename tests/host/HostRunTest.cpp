@@ -43,7 +43,7 @@ TEST_F(HostTest, RunConvertsTheEpsFilesAndLeavesTheRefusedOneInPlace)
                              "tiny.eps", "not-really.eps"})
         CopyExample(name, folder);
 
-    hf_test::ProcessResult run = Host({"run", folder});
+    testkit::ProcessResult run = Host({"run", folder});
     EXPECT_EQ(run.exitCode, 0) << run.err;
     EXPECT_NE(run.out.find("4 done, 0 failed, 1 refused"), std::string::npos) << run.out;
     EXPECT_NE(run.out.find("refused (left in place): " + folder + "/not-really.eps"),
@@ -87,7 +87,7 @@ TEST_F(HostTest, PassThroughDeliversTheOriginalBytes)
     std::string folder = scratch + "/hot";
     ASSERT_EQ(Host({"init", folder, "--server", kServer}).exitCode, 0);
     CopyExample("label-with-preview.eps", folder);
-    hf_test::ProcessResult run = Host({"run", folder, "--out", scratch + "/delivered"});
+    testkit::ProcessResult run = Host({"run", folder, "--out", scratch + "/delivered"});
     EXPECT_EQ(run.exitCode, 0) << run.err;
     EXPECT_EQ(ReadFile(scratch + "/delivered/label-with-preview.eps"),
               ReadFile(kExamples + "/eps/label-with-preview.eps"));
@@ -155,7 +155,7 @@ TEST_F(HostTest, StatsReportTheTimeOutsideTheFilter)
 {
     std::string folder = MakePostScriptFolder();
     CopyExample("tiny.eps", folder);
-    hf_test::ProcessResult run = Host({"run", folder, "--stats"});
+    testkit::ProcessResult run = Host({"run", folder, "--stats"});
     ASSERT_EQ(run.exitCode, 0);
     double total = -1, sniff = -1, inside = -1, outside = -1, share = -1;
     size_t at = run.out.find("Timing:");

@@ -31,9 +31,9 @@ protected:
     std::string MakePrinterFolder(const std::string& paper)
     {
         const std::string folder = scratch + "/hot";
-        hf_test::ProcessResult init = Host({"init", folder, "--ppd", ppd_sources::TestPpd()});
+        testkit::ProcessResult init = Host({"init", folder, "--ppd", ppd_sources::TestPpd()});
         EXPECT_EQ(init.exitCode, 0) << init.err;
-        hf_test::ProcessResult set = Host({"settings", folder, "--set", "OUTPUTFILETYPEEPS=0",
+        testkit::ProcessResult set = Host({"settings", folder, "--set", "OUTPUTFILETYPEEPS=0",
                                            "OUTPUTFILETYPEPS=1", "DEFAULTPAGESIZE=" + paper});
         EXPECT_EQ(set.exitCode, 0) << set.err;
         return folder;
@@ -48,7 +48,7 @@ TEST_F(HostSubmit, TheOutputIsPrintedOnTheJobsPaper)
     // Letter, not the queue's default A4: the paper travels with the job.
     const std::string folder = MakePrinterFolder("Letter");
     CopyExample("label.eps", folder);
-    hf_test::ProcessResult run = Host({"run", folder, "--submit", std::string("cups:") + kQueue});
+    testkit::ProcessResult run = Host({"run", folder, "--submit", std::string("cups:") + kQueue});
     ASSERT_EQ(run.exitCode, 0) << run.err << scheduler->Log();
     EXPECT_NE(run.out.find(std::string("queued on ") + kQueue + " as CUPS job "), std::string::npos)
         << run.out;
@@ -73,7 +73,7 @@ TEST_F(HostSubmit, ARefusedSubmissionKeepsTheOutputAndFailsTheRun)
 {
     const std::string folder = MakePrinterFolder("A4");
     CopyExample("label.eps", folder);
-    hf_test::ProcessResult run = Host({"run", folder, "--submit", "cups:no_such_queue"});
+    testkit::ProcessResult run = Host({"run", folder, "--submit", "cups:no_such_queue"});
     EXPECT_EQ(run.exitCode, 1) << run.out << run.err;
     EXPECT_NE(run.err.find("submission to no_such_queue failed: "), std::string::npos) << run.err;
     EXPECT_NE(run.out.find("0 done, 1 failed"), std::string::npos) << run.out;

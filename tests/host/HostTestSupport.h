@@ -34,7 +34,7 @@ inline const std::string kContainer = "[_Orv_HotFolder_]";
 
 inline std::string ReadFile(const std::string& path)
 {
-    return hf_test::ReadWholeFile(path);
+    return testkit::ReadFile(path);
 }
 
 inline void WriteFile(const std::string& path, const std::string& bytes)
@@ -148,10 +148,10 @@ protected:
     }
     void TearDown() override { nftw(scratch.c_str(), RemoveEntry, 16, FTW_DEPTH | FTW_PHYS); }
 
-    hf_test::ProcessResult Host(std::vector<std::string> args)
+    testkit::ProcessResult Host(std::vector<std::string> args)
     {
         args.insert(args.begin(), kHost);
-        return hf_test::RunProgram(args);
+        return testkit::RunProgram(args);
     }
 
     std::string Container(const std::string& folder) { return folder + "/" + kContainer; }
@@ -169,9 +169,9 @@ protected:
     std::string MakePostScriptFolder(const std::string& paper = "A4")
     {
         std::string folder = scratch + "/hot";
-        hf_test::ProcessResult init = Host({"init", folder, "--server", kServer});
+        testkit::ProcessResult init = Host({"init", folder, "--server", kServer});
         EXPECT_EQ(init.exitCode, 0) << init.err;
-        hf_test::ProcessResult set = Host({"settings", folder, "--set", "OUTPUTFILETYPEEPS=0",
+        testkit::ProcessResult set = Host({"settings", folder, "--set", "OUTPUTFILETYPEEPS=0",
                                            "OUTPUTFILETYPEPS=1", "DEFAULTPAGESIZE=" + paper});
         EXPECT_EQ(set.exitCode, 0) << set.err;
         return folder;

@@ -72,7 +72,7 @@ TEST_F(HostWatchTest, TheStopMarkerEndsTheWatch)
 
     // While the marker stands, a run does nothing.
     CopyExample("label.eps", folder);
-    hf_test::ProcessResult run = Host({"run", folder});
+    testkit::ProcessResult run = Host({"run", folder});
     EXPECT_EQ(run.exitCode, 0);
     EXPECT_TRUE(Exists(folder + "/label.eps"));
 }

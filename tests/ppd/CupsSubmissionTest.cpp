@@ -120,7 +120,7 @@ TEST_F(CupsSubmission, PaperAndNameTravelWithTheJob)
     ASSERT_EQ(job.state, IPP_JSTATE_COMPLETED) << scheduler->Log();
     EXPECT_EQ(job.name, "artwork.eps");
     EXPECT_EQ(job.pageSize, "Letter");
-    const std::string printed = hf_test::ReadWholeFile(device);
+    const std::string printed = testkit::ReadFile(device);
     EXPECT_NE(printed.find("hf-marker-paper"), std::string::npos) << printed;
     // The queue's filter selected Letter, not the queue's default A4.
     EXPECT_NE(printed.find("%%BeginFeature: *PageSize Letter\n"
@@ -142,7 +142,7 @@ TEST_F(CupsSubmission, CustomSizeAsCustomPaperAndFileNameAsDefaultTitle)
     ASSERT_EQ(job.state, IPP_JSTATE_COMPLETED) << scheduler->Log();
     EXPECT_EQ(job.name, "poster.ps");
     EXPECT_EQ(job.pageSize, "Custom.300x400");
-    const std::string printed = hf_test::ReadWholeFile(device);
+    const std::string printed = testkit::ReadFile(device);
     EXPECT_NE(printed.find("hf-marker-custom"), std::string::npos);
     // The PPD's custom size code, fed the width and height in points.
     EXPECT_NE(printed.find("%%BeginFeature: *CustomPageSize True\n300\n400\n"), std::string::npos)

@@ -33,7 +33,7 @@ hf_test::GhostscriptReport RunOnPrinter(const wxString& psFile, const wxString& 
         return hf_test::RunGhostscriptBBox(psFile.ToStdString());
     const wxString withPrinter = psFile + ".printer.ps";
     sample::WriteFile(withPrinter,
-                      kHpResidentProcSet + hf_test::ReadWholeFile(psFile.ToStdString()));
+                      kHpResidentProcSet + testkit::ReadFile(psFile.ToStdString()));
     return hf_test::RunGhostscriptBBox(withPrinter.ToStdString());
 }
 
@@ -42,7 +42,7 @@ class PaperConversion : public hf_test::ModuleTest
 protected:
     void SetUp() override
     {
-        if (!hf_test::ProgramAvailable("gs"))
+        if (!testkit::ProgramAvailable("gs"))
             GTEST_SKIP() << "Ghostscript (gs) is not installed";
         ModuleTest::SetUp();
     }

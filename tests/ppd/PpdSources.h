@@ -33,7 +33,7 @@ struct TableCase
 inline std::vector<TableCase> DescriptionTable()
 {
     const std::string dir = std::string(HF_TEST_DATA_DIR) + "/ppd/";
-    std::istringstream lines(hf_test::ReadWholeFile(dir + "descriptions.txt"));
+    std::istringstream lines(testkit::ReadFile(dir + "descriptions.txt"));
     std::vector<TableCase> cases;
     for (std::string line; std::getline(lines, line);)
     {
@@ -54,9 +54,9 @@ inline std::vector<TableCase> DescriptionTable()
 // "" when CUPS's PPD compiler or its sample driver is not installed.
 inline std::string GenericPostScriptPpd(const std::string& dir)
 {
-    if (!hf_test::ProgramAvailable("ppdc") || access(kSampleDriver, R_OK) != 0)
+    if (!testkit::ProgramAvailable("ppdc") || access(kSampleDriver, R_OK) != 0)
         return std::string();
-    const auto run = hf_test::RunProgram({"ppdc", "-d", dir, kSampleDriver});
+    const auto run = testkit::RunProgram({"ppdc", "-d", dir, kSampleDriver});
     const std::string path = dir + "/generic.ppd";
     return run.exitCode == 0 && access(path.c_str(), R_OK) == 0 ? path : std::string();
 }
@@ -68,7 +68,7 @@ inline std::vector<std::string> HpPpds(const std::string& dir, size_t count)
     std::vector<std::string> paths;
     if (access(kHpArchive, X_OK) != 0)
         return paths;
-    const auto list = hf_test::RunProgram({kHpArchive, "list"});
+    const auto list = testkit::RunProgram({kHpArchive, "list"});
     std::vector<std::string> uris;
     std::istringstream lines(list.out);
     for (std::string line; std::getline(lines, line);)
@@ -81,7 +81,7 @@ inline std::vector<std::string> HpPpds(const std::string& dir, size_t count)
     for (size_t i = 0; i < count && !uris.empty(); ++i)
     {
         const std::string& uri = uris[i * uris.size() / count];
-        const auto extracted = hf_test::RunProgram({kHpArchive, "cat", uri});
+        const auto extracted = testkit::RunProgram({kHpArchive, "cat", uri});
         if (extracted.exitCode != 0 || extracted.out.empty())
             continue;
         const std::string path = dir + "/" + uri.substr(uri.find_last_of('/') + 1);

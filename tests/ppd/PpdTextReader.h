@@ -84,7 +84,7 @@ inline bool Read(const std::string& path, Description& d)
 {
     if (access(path.c_str(), R_OK) != 0)
         return false;
-    const std::string text = hf_test::ReadWholeFile(path);
+    const std::string text = testkit::ReadFile(path);
     const bool latin1 = text.find("*LanguageEncoding: ISOLatin1") != std::string::npos;
 
     static const std::regex entry(

@@ -24,7 +24,7 @@ namespace cups_test
 // Absolute path of a program in PATH or the system folders; "" when absent.
 inline std::string FindProgram(const std::string& name)
 {
-    return hf_test::FindProgram(name, "/usr/sbin:/usr/bin:/sbin:/bin");
+    return testkit::FindProgram(name, "/usr/sbin:/usr/bin:/sbin:/bin");
 }
 
 inline sockaddr_in Loopback(int port)
@@ -137,14 +137,14 @@ public:
     bool AddFileQueue(const std::string& name, const std::string& ppd, const std::string& file,
                       std::string& problem)
     {
-        const auto run = hf_test::RunProgram({FindProgram("lpadmin"), "-h", Server(), "-p", name,
+        const auto run = testkit::RunProgram({FindProgram("lpadmin"), "-h", Server(), "-p", name,
                                               "-v", "file://" + file, "-P", ppd, "-E"});
         problem = run.err;
         return run.exitCode == 0;
     }
 
     std::string Server() const { return "127.0.0.1:" + std::to_string(m_port); }
-    std::string Log() const { return hf_test::ReadWholeFile(m_root + "/log/error_log"); }
+    std::string Log() const { return testkit::ReadFile(m_root + "/log/error_log"); }
 
 private:
     std::string m_root;

@@ -178,7 +178,7 @@ template <typename Fn> std::string CaptureStdout(Fn fn)
     dup2(saved, 1);
     close(saved);
     close(fd);
-    const std::string text = hf_test::ReadWholeFile(name);
+    const std::string text = testkit::ReadFile(name);
     unlink(name);
     return text;
 }
@@ -326,7 +326,7 @@ TEST(ServerFromPpdCommand, WritesTheFileOrStandardOutput)
     const std::string target = dir.File("server.xml").ToStdString();
     sample::WriteFile(target, "old");
     EXPECT_EQ(RunServerFromPpdCommand({ppd_sources::TestPpd(), "-o", target}), 0);
-    EXPECT_EQ(hf_test::ReadWholeFile(target), std::string(expected.utf8_str()));
+    EXPECT_EQ(testkit::ReadFile(target), std::string(expected.utf8_str()));
     wxArrayString left;
     wxDir::GetAllFiles(dir.Path(), &left);
     EXPECT_EQ(left.size(), 1u) << "no temporary file left behind";
@@ -353,7 +353,7 @@ TEST(ServerFromPpdCommand, UsageAndFailures)
     sample::WriteFile(target, "old");
     EXPECT_EQ(RunServerFromPpdCommand({dir.File("missing.ppd").ToStdString(), "-o", target}),
               kExitSetupFailed);
-    EXPECT_EQ(hf_test::ReadWholeFile(target), "old");
+    EXPECT_EQ(testkit::ReadFile(target), "old");
     // So does an unwritable target.
     EXPECT_EQ(RunServerFromPpdCommand(
                   {ppd_sources::TestPpd(), "-o", dir.File("no/such/dir/server.xml").ToStdString()}),

@@ -10,7 +10,7 @@
 inline wxString ServerFixture(const std::string& name)
 {
     return wxString::FromUTF8(
-        hf_test::ReadWholeFile(std::string(HF_TEST_DATA_DIR) + "/server/" + name));
+        testkit::ReadFile(std::string(HF_TEST_DATA_DIR) + "/server/" + name));
 }
 
 // A one-element description for the flag and value variants.

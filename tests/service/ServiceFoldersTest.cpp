@@ -42,7 +42,7 @@ TEST_F(ServiceTest, EveryWayOfArrivingIsTakenOnceAndWhole)
         if (way == "cp" || way == "rename" || way == "link")
             WriteFile(outside, label);
         if (way == "cp")
-            ASSERT_EQ(hf_test::RunProgram({"cp", outside, path}).exitCode, 0);
+            ASSERT_EQ(testkit::RunProgram({"cp", outside, path}).exitCode, 0);
         else if (way == "rename")
             ASSERT_EQ(rename(outside.c_str(), path.c_str()), 0);
         else if (way == "link")
@@ -184,7 +184,7 @@ TEST_F(ServiceTest, StatusRemoveAndStop)
                       "\tbad.eps\tInvalid input file (-1005)\n");
         ASSERT_TRUE(WaitFor([&] { return ListDirectory(Kept(a4)).size() == 1; }, 10000))
             << host->Err();
-        hf_test::ProcessResult status = Host({"status", "--json"});
+        testkit::ProcessResult status = Host({"status", "--json"});
         EXPECT_EQ(status.exitCode, 0);
         for (const std::string& part : std::vector<std::string>{
                  "\"running\": true", "\"path\": \"" + a4 + "\"",
@@ -214,7 +214,7 @@ TEST_F(ServiceTest, StatusRemoveAndStop)
     EXPECT_EQ(Host({"remove", letter}).exitCode, 3);
     EXPECT_EQ(Host({"status", "--json"}).out.find(letter), std::string::npos);
     EXPECT_TRUE(Exists(letter + "/" + kContainer)); // the folder stays
-    hf_test::ProcessResult stop = Host({"stop"});
+    testkit::ProcessResult stop = Host({"stop"});
     EXPECT_EQ(stop.exitCode, 0) << stop.err;
     EXPECT_EQ(host->Wait(5000), 0);
     // SIGTERM ends it too (systemd's stop).
@@ -226,16 +226,16 @@ TEST_F(ServiceTest, StatusRemoveAndStop)
 
 TEST_F(ServiceTest, TheInstalledUnitVerifies)
 {
-    if (hf_test::RunProgram({"systemd-analyze", "--version"}).exitCode != 0)
+    if (testkit::RunProgram({"systemd-analyze", "--version"}).exitCode != 0)
         GTEST_SKIP() << "systemd-analyze is not installed; the unit file is not verified";
     const std::string prefix = scratch + "/installed";
-    hf_test::ProcessResult install =
-        hf_test::RunProgram({HF_CMAKE_COMMAND, "--install", HF_BUILD_DIR, "--prefix", prefix});
+    testkit::ProcessResult install =
+        testkit::RunProgram({HF_CMAKE_COMMAND, "--install", HF_BUILD_DIR, "--prefix", prefix});
     ASSERT_EQ(install.exitCode, 0) << install.err;
     const std::string unit = prefix + "/lib/systemd/system/hotfolder.service";
     EXPECT_NE(ReadFile(unit).find("ExecStart=" + prefix + "/bin/hotfolder serve"),
               std::string::npos);
-    hf_test::ProcessResult verify = hf_test::RunProgram({"systemd-analyze", "verify", unit});
+    testkit::ProcessResult verify = testkit::RunProgram({"systemd-analyze", "verify", unit});
     EXPECT_EQ(verify.exitCode, 0) << verify.out << verify.err;
     EXPECT_EQ(verify.err, "");
 }

@@ -131,7 +131,7 @@ void TypeText(wxTextCtrl* field, const wxString& text)
 
 wxString TestDataText(const wxString& relative)
 {
-    return hf_test::ReadWholeFile(std::string(HF_TEST_DATA_DIR) + "/" + relative.ToStdString());
+    return testkit::ReadFile(std::string(HF_TEST_DATA_DIR) + "/" + relative.ToStdString());
 }
 
 std::map<std::string, std::string> Sorted(const MapPropToValue& settings)

@@ -16,7 +16,7 @@ using PanelConversion = PanelTest;
 
 TEST_F(PanelConversion, SavedChoicesPlaceAndSizeTheArtwork)
 {
-    if (!hf_test::ProgramAvailable("gs"))
+    if (!testkit::ProgramAvailable("gs"))
         GTEST_SKIP() << "Ghostscript is not installed";
 
     EPS filter("EPS");
