@@ -90,6 +90,14 @@ void ServedFolder::SetAside(const wxString& path)
 
 size_t ServedFolder::TakeOffered(size_t limit, const std::function<bool()>& stop)
 {
+    const size_t run = TakeBatch(limit, stop);
+    if (m_offered.empty())
+        m_jobs->ReleaseSpares();
+    return run;
+}
+
+size_t ServedFolder::TakeBatch(size_t limit, const std::function<bool()>& stop)
+{
     // Regular, visible files only: a FIFO or a device is never opened.
     std::map<FileIdentity, wxString> candidates;
     while (!m_offered.empty() && candidates.size() < limit)

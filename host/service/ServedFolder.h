@@ -46,6 +46,7 @@ public:
     size_t TakeOffered(size_t limit, const std::function<bool()>& stop);
 
 private:
+    size_t TakeBatch(size_t limit, const std::function<bool()>& stop);
     ServedFolder(std::chrono::milliseconds settle) : m_settle(settle) {}
     bool IsSetAside(const wxString& path) const;
     void SetAside(const wxString& path);

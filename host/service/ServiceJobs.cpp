@@ -25,7 +25,10 @@ namespace
 {
 const char kJobPrefix[] = "svc-";
 const char kOriginals[] = "original";
+const char kSparePrefix[] = "spare-";
 const size_t kSyncWholeBatch = 8;
+// Enough for every job of a batch in hand at once.
+const size_t kSpareLimit = 64;
 
 std::string Native(const wxString& path)
 {
@@ -156,8 +159,7 @@ JobOutcome ServiceJobs::Run(const ReadyToProcessJobInfo& job)
 {
     const wxString id = NewJobId();
     const wxString work = WorkDirectory(id);
-    if (mkdir(Native(work).c_str(), 0777) != 0 ||
-        mkdir(Native(OriginalsDirectory(id)).c_str(), 0777) != 0)
+    if (!MakeWorkDirectory(id))
     {
         ServiceLog(Severity::Error,
                    wxString::Format("%s: cannot make a work directory in %s: %s", job.jobName,
@@ -185,10 +187,53 @@ JobOutcome ServiceJobs::Run(const ReadyToProcessJobInfo& job)
     }
     if (claimed.files.empty())
     {
-        RemoveTree(work);
+        Retire(id);
         return JobOutcome::Failed;
     }
     return Continue(id, claimed);
+}
+
+bool ServiceJobs::MakeWorkDirectory(const wxString& id)
+{
+    const wxString work = WorkDirectory(id);
+    while (!m_spares.empty())
+    {
+        const wxString spare = m_spares.back();
+        m_spares.pop_back();
+        if (rename(Native(spare).c_str(), Native(work).c_str()) == 0)
+            return true;
+    }
+    return mkdir(Native(work).c_str(), 0777) == 0 &&
+           mkdir(Native(OriginalsDirectory(id)).c_str(), 0777) == 0;
+}
+
+void ServiceJobs::ReleaseSpares()
+{
+    for (const wxString& spare : m_spares)
+        RemoveTree(spare);
+    m_spares.clear();
+}
+
+void ServiceJobs::Retire(const wxString& id)
+{
+    const wxString work = WorkDirectory(id);
+    if (m_spares.size() < kSpareLimit && Originals(id).empty())
+    {
+        for (const wxString& name : EntryNames(work))
+            if (name != kOriginals)
+                RemoveEntry(wxFileName(work, name).GetFullPath());
+        const wxString spare =
+            wxFileName(m_places.workFolder,
+                       wxString::Format("%s%d-%u", kSparePrefix, static_cast<int>(getpid()),
+                                        ++m_spareCounter))
+                .GetFullPath();
+        if (rename(Native(work).c_str(), Native(spare).c_str()) == 0)
+        {
+            m_spares.push_back(spare);
+            return;
+        }
+    }
+    RemoveTree(work);
 }
 
 JobOutcome ServiceJobs::Continue(const wxString& id, ReadyToProcessJobInfo job)
@@ -343,7 +388,7 @@ JobOutcome ServiceJobs::KeepOriginals(const wxString& id, const wxString& result
             return JobOutcome::OriginalStuck;
         }
     }
-    RemoveTree(WorkDirectory(id));
+    Retire(id);
     ++m_statistics.done;
     ServiceLog(Severity::Info, result);
     if (m_journal.Large())
@@ -378,7 +423,7 @@ JobOutcome ServiceJobs::Fail(const wxString& id, const wxString& jobName, const 
     if (outcome == JobOutcome::Failed)
     {
         RemoveStaged(id);
-        RemoveTree(WorkDirectory(id));
+        Retire(id);
     }
     return outcome;
 }
@@ -417,8 +462,9 @@ void ServiceJobs::Recover()
         const wxString work = wxFileName(m_places.workFolder, entry).GetFullPath();
         if (!entry.StartsWith(kJobPrefix))
         {
-            // A killed "run" left it; its original never left the hot folder.
-            if (entry.StartsWith("job-"))
+            // A killed "run" left it (its original never left the hot
+            // folder), or it is a spare, perhaps half emptied.
+            if (entry.StartsWith("job-") || entry.StartsWith(kSparePrefix))
                 RemoveTree(work);
             continue;
         }

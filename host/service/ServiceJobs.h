@@ -25,12 +25,17 @@ class RunStatistics;
 //    the chosen names are recorded in the folder's journal (synced), then
 //    output and ticket are renamed to their final names without replacing
 //    anything, and the output folder is synced.
-// 5. The originals move to the kept-originals folder; the work directory goes.
+// 5. The originals move to the kept-originals folder; the work directory is
+//    emptied and kept as a spare "spare-<n>" for the next job of a burst;
+//    spares go when the folder has nothing more to do.
 // Doing step 4 once per batch keeps the disk syncs off the cost of each job.
+// Renaming a spare costs a few microseconds where making and removing two
+// directories costs about 150 (ext4 allocates and discards their blocks).
 //
 // At start the work folder is replayed: a work directory without originals
-// is removed; one whose recorded output is staged or delivered is finished
-// from step 4 or 5; any other is processed again from step 2.
+// is removed, and so are spares; one whose recorded output is staged or
+// delivered is finished from step 4 or 5; any other is processed again from
+// step 2.
 class ServiceJobs
 {
 public:
@@ -46,6 +51,8 @@ public:
     JobOutcome Run(const ReadyToProcessJobInfo& job);
     // Delivers every job staged since the last call (steps 4 and 5).
     void Commit();
+    // Removes the spare work directories: the folder has nothing more to do.
+    void ReleaseSpares();
     // Finishes or cleans what an earlier service left in the work folder.
     void Recover();
 
@@ -61,6 +68,12 @@ private:
     JobOutcome KeepOriginals(const wxString& id, const wxString& result);
     JobOutcome Fail(const wxString& id, const wxString& name, const wxString& reason);
     void RemoveStaged(const wxString& id);
+    // A fresh work directory with its empty originals folder, from a spare
+    // where one is left.
+    bool MakeWorkDirectory(const wxString& id);
+    // The work directory of a finished job, its originals gone: emptied and
+    // kept as a spare, or removed when there are enough.
+    void Retire(const wxString& id);
     void LogFailure(const wxString& name, const wxString& reason);
     wxString WorkDirectory(const wxString& id) const;
     wxString OriginalsDirectory(const wxString& id) const;
@@ -73,4 +86,6 @@ private:
     FolderJournal& m_journal;
     RunStatistics& m_statistics;
     std::vector<Staged> m_staged;
+    std::vector<wxString> m_spares;
+    unsigned m_spareCounter = 0;
 };
