@@ -16,4 +16,6 @@ if [ "${HF_SKIP_SANITIZERS:-0}" != 1 ]; then
   echo "== the suite again under the sanitizers =="
   "$root/scripts/sanitize.sh" "$@" || status=$((status ? status : $?))
 fi
+echo "== size of the tests against the product =="
+"$root/scripts/count-lines.sh"
 exit "$status"
