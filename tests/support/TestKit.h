@@ -128,23 +128,14 @@ inline bool WaitFor(const std::function<bool()>& condition, int timeoutMs)
     return true;
 }
 
-struct ProcessResult
+// Starts args[0] (looked up in PATH) without waiting, standard input from
+// /dev/null, standard output and error into the files named ("" leaves
+// them as they are). Extra environment entries ("NAME=value") are added.
+// The process id, or -1 when it could not start.
+inline pid_t StartProgram(const std::vector<std::string>& args, const std::string& outPath,
+                          const std::string& errPath,
+                          const std::vector<std::string>& environment = {})
 {
-    int exitCode = -1; // -1 when the program could not start or was killed
-    std::string out;
-    std::string err;
-};
-
-// Runs args[0] (looked up in PATH) with standard input from /dev/null and
-// collects its output. Extra environment entries ("NAME=value") are added.
-inline ProcessResult RunProgram(const std::vector<std::string>& args,
-                                const std::vector<std::string>& environment = {})
-{
-    ProcessResult result;
-    ScratchDir capture("hf-run");
-    const std::string outName = capture.File("out"), errName = capture.File("err");
-    const int outFd = open(outName.c_str(), O_WRONLY | O_CREAT | O_CLOEXEC, 0600);
-    const int errFd = open(errName.c_str(), O_WRONLY | O_CREAT | O_CLOEXEC, 0600);
     std::vector<char*> argv;
     for (const std::string& arg : args)
         argv.push_back(const_cast<char*>(arg.c_str()));
@@ -155,31 +146,51 @@ inline ProcessResult RunProgram(const std::vector<std::string>& args,
     for (const std::string& entry : environment)
         env.push_back(const_cast<char*>(entry.c_str()));
     env.push_back(nullptr);
-
     posix_spawn_file_actions_t actions;
     posix_spawn_file_actions_init(&actions);
     posix_spawn_file_actions_addopen(&actions, 0, "/dev/null", O_RDONLY, 0);
-    posix_spawn_file_actions_adddup2(&actions, outFd, 1);
-    posix_spawn_file_actions_adddup2(&actions, errFd, 2);
-    pid_t pid = 0;
-    const int spawnError =
-        outFd < 0 || errFd < 0
-            ? EBADF
-            : posix_spawnp(&pid, argv[0], &actions, nullptr, argv.data(), env.data());
+    if (!outPath.empty())
+        posix_spawn_file_actions_addopen(&actions, 1, outPath.c_str(), O_WRONLY | O_CREAT | O_TRUNC,
+                                         0644);
+    if (!errPath.empty())
+        posix_spawn_file_actions_addopen(&actions, 2, errPath.c_str(), O_WRONLY | O_CREAT | O_TRUNC,
+                                         0644);
+    pid_t pid = -1;
+    if (posix_spawnp(&pid, argv[0], &actions, nullptr, argv.data(), env.data()) != 0)
+        pid = -1;
     posix_spawn_file_actions_destroy(&actions);
-    close(outFd);
-    close(errFd);
-    if (spawnError == 0)
-    {
-        int status = 0;
-        while (waitpid(pid, &status, 0) < 0 && errno == EINTR)
-        {
-        }
-        if (WIFEXITED(status))
-            result.exitCode = WEXITSTATUS(status);
-    }
-    result.out = ReadFile(outName);
-    result.err = ReadFile(errName);
+    return pid;
+}
+
+// The exit code of a started program; -1 when it was killed or is unknown.
+inline int WaitProgram(pid_t pid)
+{
+    int status = 0;
+    if (pid <= 0)
+        return -1;
+    while (waitpid(pid, &status, 0) < 0)
+        if (errno != EINTR)
+            return -1;
+    return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+}
+
+struct ProcessResult
+{
+    int exitCode = -1; // -1 when the program could not start or was killed
+    std::string out;
+    std::string err;
+};
+
+// Runs args[0] to its end and collects its output.
+inline ProcessResult RunProgram(const std::vector<std::string>& args,
+                                const std::vector<std::string>& environment = {})
+{
+    ScratchDir capture("hf-run");
+    ProcessResult result;
+    result.exitCode =
+        WaitProgram(StartProgram(args, capture.File("out"), capture.File("err"), environment));
+    result.out = ReadFile(capture.File("out"));
+    result.err = ReadFile(capture.File("err"));
     return result;
 }
 
@@ -195,7 +206,10 @@ inline std::string FindProgram(const std::string& name, const std::string& extra
     return std::string();
 }
 
-inline bool ProgramAvailable(const std::string& name) { return !FindProgram(name).empty(); }
+inline bool ProgramAvailable(const std::string& name)
+{
+    return !FindProgram(name).empty();
+}
 
 // Collects what is written to file descriptor 2 while it lives.
 class StderrCapture
