@@ -28,4 +28,9 @@ endif()
 # Conversion output is checked with Ghostscript and printed through CUPS.
 set(CPACK_DEBIAN_PACKAGE_RECOMMENDS "cups-client, ghostscript")
 
+# The service is enabled at install (it starts at boot) and stopped at removal.
+set(CPACK_DEBIAN_PACKAGE_CONTROL_EXTRA
+  "${CMAKE_CURRENT_LIST_DIR}/debian/postinst;${CMAKE_CURRENT_LIST_DIR}/debian/prerm;${CMAKE_CURRENT_LIST_DIR}/debian/postrm")
+set(CPACK_DEBIAN_PACKAGE_CONTROL_STRICT_PERMISSION ON)
+
 include(CPack)
