@@ -16,8 +16,8 @@
 #include <string>
 #include <vector>
 
-#include "BenchProcess.h"
 #include "EPStoPS.h"
+#include "TestKit.h"
 
 namespace
 {
@@ -27,6 +27,13 @@ constexpr long long kBigFile = 200 * kMegabyte;
 const char kEpsHeader[] = "%!PS-Adobe-3.0 EPSF-3.0\n"
                           "%%BoundingBox: 0 0 612 792\n"
                           "%%EndComments\n";
+
+// Runs a helper program to its end, its standard error discarded; the
+// timings take exactly this start and wait.
+int RunAndWait(const std::vector<std::string>& args, const std::string& stdoutPath = "")
+{
+    return testkit::WaitProgram(testkit::StartProgram(args, stdoutPath, "/dev/null"));
+}
 
 double Seconds(const std::function<void()>& work)
 {
@@ -171,16 +178,15 @@ double DetectionMicroseconds(const std::string& path, int iterations)
 int main(int argc, char** argv)
 {
     const int runs = argc > 1 ? std::max(1, std::atoi(argv[1])) : 5;
-    char folderName[] = "/tmp/hf-bench-engine-XXXXXX";
-    if (!mkdtemp(folderName))
+    const testkit::ScratchDir scratch("hf-bench-engine");
+    if (scratch.Path().empty())
         return 1;
-    const std::string folder = folderName;
-    const std::string plain = folder + "/big.eps";
-    const std::string dos = folder + "/big-dos.eps";
-    const std::string output = folder + "/out.ps";
-    const std::string copy = folder + "/copy.out";
+    const std::string plain = scratch.File("big.eps");
+    const std::string dos = scratch.File("big-dos.eps");
+    const std::string output = scratch.File("out.ps");
+    const std::string copy = scratch.File("copy.out");
 
-    std::printf("Preparing 200 MB EPS files in %s ...\n", folder.c_str());
+    std::printf("Preparing 200 MB EPS files in %s ...\n", scratch.Path().c_str());
     WriteEps(plain, kBigFile, "");
     const std::string preview(4096, '\x49');
     WriteEps(dos, kBigFile, DosHeader(static_cast<uint32_t>(kBigFile), preview.size()));
@@ -218,7 +224,7 @@ int main(int argc, char** argv)
     std::vector<Contender> dosRun = {
         {"ConvertEPStoPS", output, [&] { Convert(dos, output); }, {}},
     };
-    if (ProgramInPath("epstool"))
+    if (testkit::ProgramAvailable("epstool"))
         dosRun.push_back(
             {"epstool -p",
              copy,
@@ -240,19 +246,15 @@ int main(int argc, char** argv)
     unlink(copy.c_str());
 
     std::printf("\nIsThisEPS\n");
-    const std::string small = folder + "/small.eps";
+    const std::string small = scratch.File("small.eps");
     WriteEps(small, 1024, "");
     std::printf("  1 KB file           %8.1f us per call\n", DetectionMicroseconds(small, 2000));
-    const std::string huge = folder + "/huge.eps";
+    const std::string huge = scratch.File("huge.eps");
     WriteEps(huge, 4096, "");
     if (truncate(huge.c_str(), 1024 * kMegabyte) == 0)
         std::printf("  1 GB file (sparse)  %8.1f us per call\n", DetectionMicroseconds(huge, 2000));
 
     std::printf("\nPeak memory of one 200 MB conversion above baseline: %ld KB (target < 4096)\n",
                 PeakKbAboveBaseline(plain, output));
-
-    for (const std::string& file : {plain, dos, output, small, huge})
-        unlink(file.c_str());
-    rmdir(folder.c_str());
     return 0;
 }

@@ -2,24 +2,15 @@
 // (default 1000), runs `hotfolder run --stats` on it `runs` times (default 3,
 // a fresh folder each time) and prints jobs per second and the share of the
 // time spent outside the filter's Process (target: under a third).
-#include <fcntl.h>
-#include <spawn.h>
-#include <sys/stat.h>
-#include <sys/wait.h>
-#include <unistd.h>
-
 #include <algorithm>
 #include <chrono>
 #include <cstdio>
 #include <cstdlib>
-#include <fstream>
 #include <sstream>
 #include <string>
 #include <vector>
 
-#include "posix/Directories.h"
-
-extern char** environ;
+#include "TestKit.h"
 
 namespace
 {
@@ -30,22 +21,7 @@ int RunHost(const std::vector<std::string>& args, const std::string& outFile)
 {
     std::vector<std::string> all = {kHost};
     all.insert(all.end(), args.begin(), args.end());
-    std::vector<char*> argv;
-    for (std::string& arg : all)
-        argv.push_back(arg.data());
-    argv.push_back(nullptr);
-    posix_spawn_file_actions_t actions;
-    posix_spawn_file_actions_init(&actions);
-    posix_spawn_file_actions_addopen(&actions, 1, outFile.c_str(), O_WRONLY | O_CREAT | O_TRUNC,
-                                     0644);
-    pid_t pid = 0;
-    int spawned = posix_spawn(&pid, argv[0], &actions, nullptr, argv.data(), environ);
-    posix_spawn_file_actions_destroy(&actions);
-    if (spawned != 0)
-        return -1;
-    int status = 0;
-    waitpid(pid, &status, 0);
-    return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+    return testkit::WaitProgram(testkit::StartProgram(all, outFile, ""));
 }
 
 std::string SmallEps(int index)
@@ -64,10 +40,10 @@ struct Figures
     size_t jobs = 0;
 };
 
-bool OneRun(const std::string& scratch, int files, Figures& figures)
+bool OneRun(const testkit::ScratchDir& scratch, int files, Figures& figures)
 {
-    const std::string folder = scratch + "/hot";
-    const std::string log = scratch + "/out.txt";
+    const std::string folder = scratch.File("hot");
+    const std::string log = scratch.File("out.txt");
     if (RunHost({"init", folder, "--server", HF_EXAMPLE_SERVER}, log) != 0 ||
         RunHost({"settings", folder, "--set", "OUTPUTFILETYPEEPS=0", "OUTPUTFILETYPEPS=1",
                  "DEFAULTPAGESIZE=Letter"},
@@ -77,13 +53,13 @@ bool OneRun(const std::string& scratch, int files, Figures& figures)
     {
         char name[64];
         std::snprintf(name, sizeof(name), "/job%05d.eps", i);
-        std::ofstream(folder + name) << SmallEps(i);
+        testkit::WriteFile(folder + name, SmallEps(i));
     }
     auto started = std::chrono::steady_clock::now();
     int status = RunHost({"run", folder, "--stats"}, log);
     figures.wall =
         std::chrono::duration<double>(std::chrono::steady_clock::now() - started).count();
-    std::ifstream in(log);
+    std::istringstream in(testkit::ReadFile(log));
     std::string line;
     bool timed = false;
     while (std::getline(in, line))
@@ -107,15 +83,12 @@ int main(int argc, char** argv)
     std::vector<Figures> results;
     for (int run = 0; run < runs; ++run)
     {
-        char pattern[] = "/tmp/hf-bench-host-XXXXXX";
-        if (!mkdtemp(pattern))
+        const testkit::ScratchDir scratch("hf-bench-host");
+        if (scratch.Path().empty())
             return 1;
-        const std::string scratch = pattern;
-        setenv("HOTFOLDER_WAREHOUSE_ROOT", (scratch + "/machine").c_str(), 1);
+        setenv("HOTFOLDER_WAREHOUSE_ROOT", scratch.File("machine").c_str(), 1);
         Figures figures;
-        bool ok = OneRun(scratch, files, figures);
-        posix::RemoveTree(scratch);
-        if (!ok)
+        if (!OneRun(scratch, files, figures))
         {
             std::fprintf(stderr, "bench_host: run %d failed (see hotfolder's output)\n", run + 1);
             return 1;
