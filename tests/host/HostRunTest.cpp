@@ -96,6 +96,20 @@ TEST_F(HostRun, AFileDeletedAfterSniffingIsReportedAndTheOthersGoOn)
     EXPECT_FALSE(Exists(Failed(folder) + "/label.eps"));
 }
 
+TEST_F(HostRun, AnOutputThatCannotBeDeliveredFailsTheJobAndKeepsTheOriginal)
+{
+    const std::string out = scratch + "/out";
+    BackgroundHost host({"run", folder, "--out", out, "--delay-jobs", "1500"}, scratch);
+    ASSERT_TRUE(
+        WaitFor([&] { return host.Out().find("found 2 job(s)") != std::string::npos; }, 10000));
+    ASSERT_EQ(rmdir(out.c_str()), 0);
+    WriteFile(out, "a file where the output folder was");
+    EXPECT_EQ(host.Wait(20000), 1);
+    EXPECT_NE(host.Err().find("cannot deliver the output: "), std::string::npos) << host.Err();
+    EXPECT_EQ(ListDirectory(Failed(folder)),
+              (std::vector<std::string>{"failed-jobs.log", "label.eps", "tiny.eps"}));
+}
+
 TEST_F(HostRun, StatsReportTheTimeOutsideTheFilter)
 {
     const testkit::ProcessResult run = Host({"run", folder, "--stats"});
