@@ -1,7 +1,8 @@
-// hotfolder run on fixture folders: outputs, tickets, moved originals,
-// refused and failed files, and the PostScript as Ghostscript sees it.
-#include <algorithm>
-#include <cmath>
+// hotfolder run where timing matters: files spoilt or deleted between
+// sniffing and processing, the time statistics, and the progress bar on a
+// terminal.
+#include <poll.h>
+#include <pty.h>
 
 #include "HostTestSupport.h"
 
@@ -9,135 +10,80 @@ using namespace host_test;
 
 namespace
 {
-// The artwork's size in either orientation, centred in the imageable box.
-void ExpectCentredArtwork(const std::string& ps, double pageWidth, double pageHeight,
-                          hf_test::Box imageable, double artworkWidth, double artworkHeight)
+// Runs the host with standard output and error on a new pseudo terminal;
+// everything it wrote there.
+std::string RunOnTerminal(const std::vector<std::string>& args)
 {
-    hf_test::GhostscriptReport report = hf_test::RunGhostscriptBBox(ps);
-    ASSERT_FALSE(report.postscriptError) << report.process.err;
-    ASSERT_TRUE(report.pageSeen);
-    EXPECT_NEAR(report.pageWidth, pageWidth, 0.5);
-    EXPECT_NEAR(report.pageHeight, pageHeight, 0.5);
-    ASSERT_TRUE(report.marked);
-    double width = report.marks.urx - report.marks.llx;
-    double height = report.marks.ury - report.marks.lly;
-    double longSide = std::max(width, height), shortSide = std::min(width, height);
-    EXPECT_NEAR(longSide, std::max(artworkWidth, artworkHeight), 1.5);
-    EXPECT_NEAR(shortSide, std::min(artworkWidth, artworkHeight), 1.5);
-    EXPECT_NEAR((report.marks.llx + report.marks.urx) / 2, (imageable.llx + imageable.urx) / 2,
-                1.5);
-    EXPECT_NEAR((report.marks.lly + report.marks.ury) / 2, (imageable.lly + imageable.ury) / 2,
-                1.5);
+    int master = -1, slave = -1;
+    if (openpty(&master, &slave, nullptr, nullptr, nullptr) != 0)
+        return "no pseudo terminal";
+    std::vector<std::string> all = {kHost};
+    all.insert(all.end(), args.begin(), args.end());
+    std::vector<char*> argv;
+    for (std::string& arg : all)
+        argv.push_back(arg.data());
+    argv.push_back(nullptr);
+    posix_spawn_file_actions_t actions;
+    posix_spawn_file_actions_init(&actions);
+    posix_spawn_file_actions_adddup2(&actions, slave, 1);
+    posix_spawn_file_actions_adddup2(&actions, slave, 2);
+    posix_spawn_file_actions_addclose(&actions, master);
+    pid_t pid = -1;
+    const bool spawned = posix_spawn(&pid, argv[0], &actions, nullptr, argv.data(), environ) == 0;
+    posix_spawn_file_actions_destroy(&actions);
+    close(slave);
+    std::string text;
+    char buffer[4096];
+    pollfd wanted{master, POLLIN, 0};
+    // Reading ends with EIO once the program and its terminal are gone.
+    while (spawned && poll(&wanted, 1, 30000) > 0)
+    {
+        const ssize_t got = read(master, buffer, sizeof buffer);
+        if (got <= 0)
+            break;
+        text.append(buffer, got);
+    }
+    close(master);
+    if (spawned)
+        waitpid(pid, nullptr, 0);
+    return text;
 }
 
-std::string TicketOf(const std::string& output)
+class HostRun : public HostTest
 {
-    return output + ".Folder.cfg";
-}
+protected:
+    void SetUp() override
+    {
+        HostTest::SetUp();
+        folder = MakePostScriptFolder();
+        CopyExample("label.eps", folder);
+        CopyExample("tiny.eps", folder);
+    }
+    std::string folder;
+};
 } // namespace
 
-TEST_F(HostTest, RunConvertsTheEpsFilesAndLeavesTheRefusedOneInPlace)
+TEST_F(HostRun, AFileSpoiltAfterSniffingFailsIntoTheFailedFolderWithALogLine)
 {
-    std::string folder = MakePostScriptFolder("A4");
-    for (const char* name : {"label.eps", "label-with-preview.eps", "banner-landscape.eps",
-                             "tiny.eps", "not-really.eps"})
-        CopyExample(name, folder);
-
-    testkit::ProcessResult run = Host({"run", folder});
-    EXPECT_EQ(run.exitCode, 0) << run.err;
-    EXPECT_NE(run.out.find("4 done, 0 failed, 1 refused"), std::string::npos) << run.out;
-    EXPECT_NE(run.out.find("refused (left in place): " + folder + "/not-really.eps"),
-              std::string::npos);
-
-    // Only the refused file stays; the others were kept as originals.
-    EXPECT_EQ(ListDirectory(folder),
-              (std::vector<std::string>{"Output", kContainer, "not-really.eps"}));
-    EXPECT_EQ(ListDirectory(Kept(folder)),
-              (std::vector<std::string>{"banner-landscape.eps", "label-with-preview.eps",
-                                        "label.eps", "tiny.eps"}));
-    EXPECT_EQ(ReadFile(Kept(folder) + "/label.eps"), ReadFile(kExamples + "/eps/label.eps"));
-    EXPECT_TRUE(ListDirectory(Container(folder) + "/[WorkFolder]").empty());
-
-    const std::string output = folder + "/Output";
-    EXPECT_EQ(ListDirectory(output).size(), 8u);
-    const hf_test::Box a4Imageable{12, 12, 583, 830};
-    ExpectCentredArtwork(output + "/label.ps", 595, 842, a4Imageable, 288, 144);
-    ExpectCentredArtwork(output + "/label-with-preview.ps", 595, 842, a4Imageable, 288, 144);
-    ExpectCentredArtwork(output + "/banner-landscape.ps", 595, 842, a4Imageable, 500, 250);
-    ExpectCentredArtwork(output + "/tiny.ps", 595, 842, a4Imageable, 36, 18);
-}
-
-TEST_F(HostTest, TheTicketIsTheFolderConfigurationWithThePaperAsOverride)
-{
-    std::string folder = MakePostScriptFolder("Letter");
-    CopyExample("label.eps", folder);
-    ASSERT_EQ(Host({"run", folder}).exitCode, 0);
-
-    std::string ticket = ReadFile(TicketOf(folder + "/Output/label.ps"));
-    EXPECT_NE(ticket.find("<HotFolder name=\"hot\""), std::string::npos) << ticket;
-    EXPECT_NE(ticket.find("Key=\"PageSize\" Value=\"Letter\""), std::string::npos) << ticket;
-    // The override belongs to the job: the folder's own file has none.
-    EXPECT_EQ(ReadFile(Container(folder) + "/Folder.cfg").find("Key=\"PageSize\""),
-              std::string::npos);
-    ExpectCentredArtwork(folder + "/Output/label.ps", 612, 792, {12, 12, 600, 780}, 288, 144);
-}
-
-TEST_F(HostTest, PassThroughDeliversTheOriginalBytes)
-{
-    std::string folder = scratch + "/hot";
-    ASSERT_EQ(Host({"init", folder, "--server", kServer}).exitCode, 0);
-    CopyExample("label-with-preview.eps", folder);
-    testkit::ProcessResult run = Host({"run", folder, "--out", scratch + "/delivered"});
-    EXPECT_EQ(run.exitCode, 0) << run.err;
-    EXPECT_EQ(ReadFile(scratch + "/delivered/label-with-preview.eps"),
-              ReadFile(kExamples + "/eps/label-with-preview.eps"));
-    EXPECT_TRUE(Exists(TicketOf(scratch + "/delivered/label-with-preview.eps")));
-    EXPECT_TRUE(Exists(Kept(folder) + "/label-with-preview.eps"));
-}
-
-TEST_F(HostTest, OutputsWithTheSameNameAreNumberedNotReplaced)
-{
-    std::string folder = MakePostScriptFolder();
-    CopyExample("label.eps", folder);
-    ASSERT_EQ(Host({"run", folder}).exitCode, 0);
-    CopyExample("tiny.eps", folder);
-    rename((folder + "/tiny.eps").c_str(), (folder + "/label.EPS").c_str());
-    ASSERT_EQ(Host({"run", folder}).exitCode, 0);
-
-    EXPECT_EQ(ListDirectory(folder + "/Output"),
-              (std::vector<std::string>{"label (2).ps", "label (2).ps.Folder.cfg", "label.ps",
-                                        "label.ps.Folder.cfg"}));
-    EXPECT_EQ(ListDirectory(Kept(folder)), (std::vector<std::string>{"label.EPS", "label.eps"}));
-}
-
-TEST_F(HostTest, AFileSpoiltAfterSniffingFailsIntoTheFailedFolderWithALogLine)
-{
-    std::string folder = MakePostScriptFolder();
-    CopyExample("label.eps", folder);
-    CopyExample("tiny.eps", folder);
     BackgroundHost host({"run", folder, "--delay-jobs", "1500"}, scratch);
-    ASSERT_TRUE(host.Started());
     ASSERT_TRUE(
         WaitFor([&] { return host.Out().find("found 2 job(s)") != std::string::npos; }, 10000));
     WriteFile(folder + "/label.eps", "no longer PostScript\n");
     EXPECT_EQ(host.Wait(20000), 1);
-
     EXPECT_EQ(ListDirectory(Failed(folder)),
               (std::vector<std::string>{"failed-jobs.log", "label.eps"}));
     EXPECT_EQ(ReadFile(Failed(folder) + "/label.eps"), "no longer PostScript\n");
-    std::string log = ReadFile(Failed(folder) + "/failed-jobs.log");
-    EXPECT_NE(log.find("label.eps\tInvalid input file (-1005)"), std::string::npos) << log;
+    EXPECT_NE(
+        ReadFile(Failed(folder) + "/failed-jobs.log").find("label.eps\tInvalid input file (-1005)"),
+        std::string::npos);
     EXPECT_NE(host.Err().find("Invalid input file"), std::string::npos);
     EXPECT_NE(host.Out().find("1 done, 1 failed, 0 refused"), std::string::npos) << host.Out();
     EXPECT_TRUE(Exists(folder + "/Output/tiny.ps"));
     EXPECT_FALSE(Exists(folder + "/Output/label.ps"));
 }
 
-TEST_F(HostTest, AFileDeletedAfterSniffingIsReportedAndTheOthersGoOn)
+TEST_F(HostRun, AFileDeletedAfterSniffingIsReportedAndTheOthersGoOn)
 {
-    std::string folder = MakePostScriptFolder();
-    CopyExample("label.eps", folder);
-    CopyExample("tiny.eps", folder);
     BackgroundHost host({"run", folder, "--delay-jobs", "1500"}, scratch);
     ASSERT_TRUE(
         WaitFor([&] { return host.Out().find("found 2 job(s)") != std::string::npos; }, 10000));
@@ -147,18 +93,29 @@ TEST_F(HostTest, AFileDeletedAfterSniffingIsReportedAndTheOthersGoOn)
               std::string::npos)
         << host.Err();
     EXPECT_TRUE(Exists(folder + "/Output/tiny.ps"));
-    EXPECT_TRUE(ListDirectory(Failed(folder)).empty() ||
-                ListDirectory(Failed(folder)) == std::vector<std::string>{"failed-jobs.log"});
+    EXPECT_FALSE(Exists(Failed(folder) + "/label.eps"));
 }
 
-TEST_F(HostTest, StatsReportTheTimeOutsideTheFilter)
+TEST_F(HostRun, AnOutputThatCannotBeDeliveredFailsTheJobAndKeepsTheOriginal)
 {
-    std::string folder = MakePostScriptFolder();
-    CopyExample("tiny.eps", folder);
-    testkit::ProcessResult run = Host({"run", folder, "--stats"});
+    const std::string out = scratch + "/out";
+    BackgroundHost host({"run", folder, "--out", out, "--delay-jobs", "1500"}, scratch);
+    ASSERT_TRUE(
+        WaitFor([&] { return host.Out().find("found 2 job(s)") != std::string::npos; }, 10000));
+    ASSERT_EQ(rmdir(out.c_str()), 0);
+    WriteFile(out, "a file where the output folder was");
+    EXPECT_EQ(host.Wait(20000), 1);
+    EXPECT_NE(host.Err().find("cannot deliver the output: "), std::string::npos) << host.Err();
+    EXPECT_EQ(ListDirectory(Failed(folder)),
+              (std::vector<std::string>{"failed-jobs.log", "label.eps", "tiny.eps"}));
+}
+
+TEST_F(HostRun, StatsReportTheTimeOutsideTheFilter)
+{
+    const testkit::ProcessResult run = Host({"run", folder, "--stats"});
     ASSERT_EQ(run.exitCode, 0);
     double total = -1, sniff = -1, inside = -1, outside = -1, share = -1;
-    size_t at = run.out.find("Timing:");
+    const size_t at = run.out.find("Timing:");
     ASSERT_NE(at, std::string::npos) << run.out;
     ASSERT_EQ(std::sscanf(run.out.c_str() + at,
                           "Timing: total %lf s, sniffing %lf s, inside Process %lf s, outside "
@@ -167,5 +124,15 @@ TEST_F(HostTest, StatsReportTheTimeOutsideTheFilter)
               5);
     EXPECT_GT(inside, 0);
     EXPECT_NEAR(inside + outside, total, 0.002);
-    EXPECT_NE(run.out.find("Throughput: 1 jobs"), std::string::npos);
+}
+
+// On a terminal a bar runs up to 100 % (on a pipe each job gets a line
+// instead, see run.txt).
+TEST_F(HostRun, AProgressBarOnATerminal)
+{
+    const std::string shown = RunOnTerminal({"run", folder});
+    EXPECT_NE(shown.find("\r\033[K[##"), std::string::npos) << shown;
+    EXPECT_NE(shown.find("] 100%  2/2  "), std::string::npos) << shown;
+    EXPECT_EQ(shown.find("[2/2]"), std::string::npos) << shown;
+    EXPECT_NE(shown.find("2 done, 0 failed"), std::string::npos) << shown;
 }

@@ -1,5 +1,8 @@
 // hotfolder run --watch: files arriving slowly or in bursts are each
 // processed exactly once; the run stops cleanly on a signal or the marker.
+#include <fstream>
+#include <thread>
+
 #include "HostTestSupport.h"
 
 using namespace host_test;

@@ -1,47 +1,30 @@
-// Job overrides as CUPS options.
+// Job overrides as CUPS options, one case a line of cups-options.txt.
 #include <gtest/gtest.h>
 
 #include "CupsJobOptions.h"
+#include "TestKit.h"
 
-using printing::CupsOptionsFromOverrides;
-using printing::OptionList;
-
-TEST(CupsJobOptions, PaperKeywordBecomesPageSize)
+namespace
 {
-    EXPECT_EQ(CupsOptionsFromOverrides({{"PageSize", "A4"}}), (OptionList{{"PageSize", "A4"}}));
-    // The filter stores what the settings hold, blanks included.
-    EXPECT_EQ(CupsOptionsFromOverrides({{"PageSize", "Letter \t"}}),
-              (OptionList{{"PageSize", "Letter"}}));
-}
-
-TEST(CupsJobOptions, CustomSizeBecomesCustomKeywordInPoints)
+printing::OptionList Pairs(const std::string& text)
 {
-    EXPECT_EQ(CupsOptionsFromOverrides({{"PageSize", "Custom"}, {"CustomPageSize", "612 792"}}),
-              (OptionList{{"PageSize", "Custom.612x792"}}));
-    // Settings keep six decimals; fractions survive, trailing zeros go.
-    EXPECT_EQ(CupsOptionsFromOverrides(
-                  {{"CustomPageSize", "283.500000 425.250000"}, {"PageSize", "Custom"}}),
-              (OptionList{{"PageSize", "Custom.283.5x425.25"}}));
-}
-
-TEST(CupsJobOptions, BadCustomSizesLeaveThePaperToTheQueue)
-{
-    for (const char* size : {"", "612", "612 792 10", "612,5 792", "wide tall", "0 792", "-5 5"})
+    printing::OptionList pairs;
+    for (size_t start = 0; text != "-" && start <= text.size();)
     {
-        EXPECT_TRUE(
-            CupsOptionsFromOverrides({{"PageSize", "Custom"}, {"CustomPageSize", size}}).empty())
-            << size;
+        size_t end = text.find("; ", start);
+        end = end == std::string::npos ? text.size() : end;
+        const std::string pair = text.substr(start, end - start);
+        pairs.emplace_back(pair.substr(0, pair.find('=')), pair.substr(pair.find('=') + 1));
+        start = end + 2;
     }
-    // A custom size alone does not choose the custom paper.
-    EXPECT_TRUE(CupsOptionsFromOverrides({{"CustomPageSize", "612 792"}}).empty());
+    return pairs;
 }
+} // namespace
 
-TEST(CupsJobOptions, OtherOverridesPassThroughLastOneWins)
+TEST(CupsJobOptions, OverridesOfTheTable)
 {
-    const OptionList options = CupsOptionsFromOverrides({{"Duplex", "None"},
-                                                         {"Collate", ""},
-                                                         {"PageSize", "A3"},
-                                                         {"Duplex", "DuplexNoTumble"},
-                                                         {"", "orphan"}});
-    EXPECT_EQ(options, (OptionList{{"PageSize", "A3"}, {"Duplex", "DuplexNoTumble"}}));
+    const auto cases = testkit::ReadCaseTable("ppd/cups-options.txt");
+    ASSERT_FALSE(cases.empty());
+    for (const testkit::CaseFields& row : cases)
+        EXPECT_EQ(printing::CupsOptionsFromOverrides(Pairs(row[0])), Pairs(row[1])) << row.back();
 }

@@ -1,28 +1,28 @@
 // Submission to a real CUPS scheduler started by the test: the job gets
-// its name and paper, and the PostScript reaches the queue's device file.
+// its name and paper, and the PostScript reaches the queue's device file
+// through the queue's own filter.
 #include <chrono>
+#include <memory>
 #include <thread>
 
 #include <cups/cups.h>
 #include <gtest/gtest.h>
 
+#include "CupsJobOptions.h"
 #include "CupsSubmission.h"
-#include "PpdSources.h"
+#include "PpdCases.h"
 #include "PrivateCupsd.h"
-#include "SampleEps.h"
 
 using printing::SubmitToCups;
 
 namespace
 {
 const char* const kQueue = "hotfolder_test";
-const char* const kFilter = "/usr/lib/cups/filter/pstops";
 
 struct Job
 {
     int state = 0;
-    std::string name;
-    std::string pageSize;
+    std::string name, pageSize;
 };
 
 class CupsSubmission : public ::testing::Test
@@ -31,139 +31,100 @@ protected:
     void SetUp() override
     {
         if (!cups_test::PrivateCupsd::Installed())
-            GTEST_SKIP() << "cupsd or lpadmin missing (packages cups-daemon, cups-client)";
-        if (access(kFilter, X_OK) != 0)
-            GTEST_SKIP() << kFilter << " missing (package cups-core-drivers)";
-        scheduler = std::make_unique<cups_test::PrivateCupsd>(scratch.Path().ToStdString());
+            GTEST_SKIP() << cups_test::PrivateCupsd::kMissing;
+        scheduler = std::make_unique<cups_test::PrivateCupsd>(scratch.Path());
         std::string problem;
         ASSERT_TRUE(scheduler->Start(problem)) << problem;
-        device = scratch.File("device.ps").ToStdString();
-        ASSERT_TRUE(scheduler->AddFileQueue(kQueue, ppd_sources::TestPpd(), device, problem))
+        ASSERT_TRUE(scheduler->AddFileQueue(kQueue, ppd_cases::TestPpd(), device, problem))
             << problem;
         cupsSetServer(scheduler->Server().c_str());
+        testkit::WriteFile(artwork, "%!PS-Adobe-3.0\n%%BoundingBox: 0 0 72 72\n%%Pages: 1\n"
+                                    "%%EndComments\n%%Page: 1 1\n(hf-marker) pop\n"
+                                    "newpath 0 0 moveto 72 72 lineto stroke\nshowpage\n%%EOF\n");
     }
-    void TearDown() override
-    {
-        cupsSetServer(nullptr);
-        scheduler.reset();
-    }
-
-    std::string Artwork(const std::string& name, const std::string& marker)
-    {
-        const std::string path = scratch.File(name).ToStdString();
-        sample::WriteFile(path, "%!PS-Adobe-3.0\n%%BoundingBox: 0 0 72 72\n%%Pages: 1\n"
-                                "%%EndComments\n%%Page: 1 1\n(" +
-                                    marker +
-                                    ") pop\nnewpath 0 0 moveto 72 72 lineto stroke\n"
-                                    "showpage\n%%EOF\n");
-        return path;
-    }
-
-    static Job Attributes(int id)
-    {
-        ipp_t* request = ippNewRequest(IPP_OP_GET_JOB_ATTRIBUTES);
-        const std::string uri = "ipp://localhost/jobs/" + std::to_string(id);
-        ippAddString(request, IPP_TAG_OPERATION, IPP_TAG_URI, "job-uri", nullptr, uri.c_str());
-        ippAddString(request, IPP_TAG_OPERATION, IPP_TAG_NAME, "requesting-user-name", nullptr,
-                     cupsUser());
-        Job job;
-        ipp_t* response = cupsDoRequest(CUPS_HTTP_DEFAULT, request, "/");
-        if (!response)
-            return job;
-        if (ipp_attribute_t* a = ippFindAttribute(response, "job-state", IPP_TAG_ENUM))
-            job.state = ippGetInteger(a, 0);
-        if (ipp_attribute_t* a = ippFindAttribute(response, "job-name", IPP_TAG_ZERO))
-            job.name = ippGetString(a, 0, nullptr);
-        if (ipp_attribute_t* a = ippFindAttribute(response, "PageSize", IPP_TAG_ZERO))
-            job.pageSize = ippGetString(a, 0, nullptr);
-        ippDelete(response);
-        return job;
-    }
+    void TearDown() override { cupsSetServer(nullptr); }
 
     // The job once it has left the queue, one way or another.
-    Job Finished(int id)
+    static Job Finished(int id)
     {
         Job job;
-        for (int i = 0; i < 600; ++i)
+        const std::string uri = "ipp://localhost/jobs/" + std::to_string(id);
+        for (int i = 0; i < 600 && job.state < IPP_JSTATE_CANCELED; ++i)
         {
-            job = Attributes(id);
-            if (job.state >= IPP_JSTATE_CANCELED)
-                break;
-            std::this_thread::sleep_for(std::chrono::milliseconds(100));
+            std::this_thread::sleep_for(std::chrono::milliseconds(i ? 100 : 0));
+            ipp_t* request = ippNewRequest(IPP_OP_GET_JOB_ATTRIBUTES);
+            ippAddString(request, IPP_TAG_OPERATION, IPP_TAG_URI, "job-uri", nullptr, uri.c_str());
+            ippAddString(request, IPP_TAG_OPERATION, IPP_TAG_NAME, "requesting-user-name", nullptr,
+                         cupsUser());
+            ipp_t* response = cupsDoRequest(CUPS_HTTP_DEFAULT, request, "/");
+            if (ipp_attribute_t* a = ippFindAttribute(response, "job-state", IPP_TAG_ENUM))
+                job.state = ippGetInteger(a, 0);
+            if (ipp_attribute_t* a = ippFindAttribute(response, "job-name", IPP_TAG_ZERO))
+                job.name = ippGetString(a, 0, nullptr);
+            if (ipp_attribute_t* a = ippFindAttribute(response, "PageSize", IPP_TAG_ZERO))
+                job.pageSize = ippGetString(a, 0, nullptr);
+            ippDelete(response);
         }
         return job;
     }
 
-    int JobsOnQueue()
-    {
-        cups_job_t* jobs = nullptr;
-        const int count = cupsGetJobs2(CUPS_HTTP_DEFAULT, &jobs, kQueue, 0, CUPS_WHICHJOBS_ALL);
-        cupsFreeJobs(count, jobs);
-        return count;
-    }
-
-    sample::ScratchDir scratch;
+    testkit::ScratchDir scratch{"hf-cups"};
+    const std::string device = scratch.File("device.ps"), artwork = scratch.File("art.ps");
     std::unique_ptr<cups_test::PrivateCupsd> scheduler;
-    std::string device;
 };
 } // namespace
 
+// Letter and a custom size, not the queue's default A4: what the queue's
+// filter selected is in the device file.
 TEST_F(CupsSubmission, PaperAndNameTravelWithTheJob)
 {
-    const std::string ps = Artwork("artwork.ps", "hf-marker-paper");
-    std::string error;
-    int id = 0;
-    ASSERT_TRUE(SubmitToCups(kQueue, ps, "artwork.eps", {{"PageSize", "Letter"}}, error, &id))
-        << error;
-    EXPECT_GT(id, 0);
-    const Job job = Finished(id);
-    ASSERT_EQ(job.state, IPP_JSTATE_COMPLETED) << scheduler->Log();
-    EXPECT_EQ(job.name, "artwork.eps");
-    EXPECT_EQ(job.pageSize, "Letter");
-    const std::string printed = testkit::ReadFile(device);
-    EXPECT_NE(printed.find("hf-marker-paper"), std::string::npos) << printed;
-    // The queue's filter selected Letter, not the queue's default A4.
-    EXPECT_NE(printed.find("%%BeginFeature: *PageSize Letter\n"
-                           "<</PageSize[612 792]/ImagingBBox null>>setpagedevice"),
-              std::string::npos)
-        << printed;
-}
-
-TEST_F(CupsSubmission, CustomSizeAsCustomPaperAndFileNameAsDefaultTitle)
-{
-    const std::string ps = Artwork("poster.ps", "hf-marker-custom");
-    std::string error;
-    int id = 0;
-    ASSERT_TRUE(SubmitToCups(kQueue, ps, "",
-                             {{"PageSize", "Custom"}, {"CustomPageSize", "300.000000 400.000000"}},
-                             error, &id))
-        << error;
-    const Job job = Finished(id);
-    ASSERT_EQ(job.state, IPP_JSTATE_COMPLETED) << scheduler->Log();
-    EXPECT_EQ(job.name, "poster.ps");
-    EXPECT_EQ(job.pageSize, "Custom.300x400");
-    const std::string printed = testkit::ReadFile(device);
-    EXPECT_NE(printed.find("hf-marker-custom"), std::string::npos);
-    // The PPD's custom size code, fed the width and height in points.
-    EXPECT_NE(printed.find("%%BeginFeature: *CustomPageSize True\n300\n400\n"), std::string::npos)
-        << printed;
+    const struct
+    {
+        printing::OptionList options;
+        std::string title, name, pageSize, selected;
+    } cases[] = {
+        {{{"PageSize", "Letter"}},
+         "artwork.eps",
+         "artwork.eps",
+         "Letter",
+         "%%BeginFeature: *PageSize Letter\n<</PageSize[612 792]/ImagingBBox null>>setpagedevice"},
+        {{{"PageSize", "Custom"}, {"CustomPageSize", "300.000000 400.000000"}},
+         "",
+         "art.ps",
+         "Custom.300x400",
+         "%%BeginFeature: *CustomPageSize True\n300\n400\n"},
+    };
+    for (const auto& c : cases)
+    {
+        std::string error;
+        int id = 0;
+        ASSERT_TRUE(SubmitToCups(kQueue, artwork, c.title, c.options, error, &id)) << error;
+        EXPECT_GT(id, 0);
+        const Job job = Finished(id);
+        ASSERT_EQ(job.state, IPP_JSTATE_COMPLETED) << scheduler->Log();
+        EXPECT_EQ(job.name, c.name) << "an empty title names the job after the file";
+        EXPECT_EQ(job.pageSize, c.pageSize);
+        const std::string printed = testkit::ReadFile(device);
+        EXPECT_NE(printed.find("hf-marker"), std::string::npos);
+        EXPECT_NE(printed.find(c.selected), std::string::npos) << printed;
+    }
 }
 
 TEST_F(CupsSubmission, FailuresSayWhyAndLeaveNoJob)
 {
-    const std::string ps = Artwork("a.ps", "hf-marker-fail");
     std::string error;
-    EXPECT_FALSE(SubmitToCups("no_such_queue", ps, "a", {}, error));
+    EXPECT_FALSE(SubmitToCups("no_such_queue", artwork, "a", {}, error));
     EXPECT_NE(error.find("no_such_queue"), std::string::npos) << error;
-
     error.clear();
-    EXPECT_FALSE(SubmitToCups(kQueue, scratch.File("missing.ps").ToStdString(), "m", {}, error));
+    EXPECT_FALSE(SubmitToCups(kQueue, scratch.File("missing.ps"), "m", {}, error));
     EXPECT_NE(error.find("missing.ps"), std::string::npos) << error;
-    EXPECT_EQ(JobsOnQueue(), 0);
+    cups_job_t* jobs = nullptr;
+    const int count = cupsGetJobs2(CUPS_HTTP_DEFAULT, &jobs, kQueue, 0, CUPS_WHICHJOBS_ALL);
+    cupsFreeJobs(count, jobs);
+    EXPECT_EQ(count, 0);
 
-    // A scheduler that is gone.
-    scheduler->Stop();
+    scheduler->Stop(); // a scheduler that is gone
     error.clear();
-    EXPECT_FALSE(SubmitToCups(kQueue, ps, "a", {{"PageSize", "A4"}}, error));
+    EXPECT_FALSE(SubmitToCups(kQueue, artwork, "a", {{"PageSize", "A4"}}, error));
     EXPECT_GT(error.size(), std::string("cannot create a job on ").size() + 15) << error;
 }

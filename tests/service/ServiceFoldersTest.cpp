@@ -1,23 +1,12 @@
 // The service's folders: how files arrive, several folders each by its own
 // settings, the list changing while it serves, bad input, status and stop,
 // and the systemd unit.
-#include <sys/file.h>
-
 #include "ServiceTestSupport.h"
 
 using namespace service_test;
 
 namespace
 {
-std::string Now()
-{
-    char text[32];
-    const time_t now = time(nullptr);
-    struct tm local;
-    strftime(text, sizeof(text), "%Y-%m-%d %H:%M:%S", localtime_r(&now, &local));
-    return text;
-}
-
 void WriteSome(int fd, const std::string& bytes)
 {
     ASSERT_EQ(write(fd, bytes.data(), bytes.size()), static_cast<ssize_t>(bytes.size()));
@@ -26,7 +15,7 @@ void WriteSome(int fd, const std::string& bytes)
 
 TEST_F(ServiceTest, EveryWayOfArrivingIsTakenOnceAndWhole)
 {
-    const std::string folder = MakeFolder("hot");
+    const std::string folder = MakePostScriptFolder("A4", "hot");
     auto host = Serve(1);
     const std::string half = label.substr(0, label.size() / 2), rest = label.substr(half.size());
     const auto stillWaiting = [&](const std::string& path)
@@ -34,9 +23,10 @@ TEST_F(ServiceTest, EveryWayOfArrivingIsTakenOnceAndWhole)
         std::this_thread::sleep_for(std::chrono::milliseconds(500)); // > settle time
         EXPECT_TRUE(Exists(path)) << path << " was taken while open for writing";
     };
-    for (const std::string& line : DataLines("arrivals.txt"))
+    const auto arrivals = testkit::ReadCaseTable("service/arrivals.txt");
+    for (const testkit::CaseFields& row : arrivals)
     {
-        const std::string way = line.substr(0, line.find(' '));
+        const std::string &way = row[0], &line = row.back();
         const std::string path = folder + "/" + way + ".eps";
         const std::string outside = scratch + "/" + way + ".eps";
         if (way == "cp" || way == "rename" || way == "link")
@@ -67,17 +57,24 @@ TEST_F(ServiceTest, EveryWayOfArrivingIsTakenOnceAndWhole)
             }
             close(fd);
         }
-        const std::string output = folder + "/Output/" + way + ".ps";
-        ASSERT_TRUE(WaitFor([&] { return Exists(output) && !Exists(path); }, 10000)) << line << "\n"
-                                                                                     << host->Err();
+        const std::string output = folder + "/Output/" + way + ".ps",
+                          kept = Kept(folder) + "/" + way + ".eps";
+        ASSERT_TRUE(WaitFor([&] { return Exists(output) && !Exists(path) && Exists(kept); }, 10000))
+            << line << "\n"
+            << host->Err();
         // The whole EPS program went into the job: its last line is in the output.
         const std::string body = label.substr(0, label.find_last_not_of("\r\n") + 1);
         const std::string lastLine = body.substr(body.find_last_of("\r\n") + 1);
         EXPECT_NE(ReadFile(output).find(lastLine), std::string::npos) << line;
-        EXPECT_EQ(ReadFile(Kept(folder) + "/" + way + ".eps"), label) << line;
+        EXPECT_EQ(ReadFile(kept), label) << line;
     }
-    EXPECT_EQ(ListDirectory(folder + "/Output").size(), 2 * DataLines("arrivals.txt").size());
+    EXPECT_EQ(ListDirectory(folder + "/Output").size(), 2 * arrivals.size());
     EXPECT_EQ(Count(host->Err(), "<3>"), 0u) << host->Err();
+    // A file the filter does not take is left in place with a warning.
+    CopyExample("not-really.eps", folder);
+    EXPECT_TRUE(WaitFor(
+        [&] { return Count(host->Err(), "<4>refused (left in place): " + folder) == 1; }, 5000))
+        << host->Err();
 }
 
 TEST_F(ServiceTest, EachFolderByItsOwnSettingsAsTheListChanges)
@@ -85,30 +82,23 @@ TEST_F(ServiceTest, EachFolderByItsOwnSettingsAsTheListChanges)
     const std::vector<std::pair<std::string, std::string>> papers = {
         {"a4", "A4"}, {"letter", "Letter"}, {"a3", "A3"}};
     for (const auto& paper : papers)
-        MakeFolder(paper.first, paper.second);
-    const std::string broken = MakeFolder("broken");
-    WriteFile(Container(broken) + "/Folder.cfg", "not a configuration");
+        MakePostScriptFolder(paper.second, paper.first);
     auto host = Serve(papers.size());
-    EXPECT_NE(host->Err().find("<3>cannot serve " + broken), std::string::npos) << host->Err();
 
-    for (const auto& paper : papers)
-        for (int i = 0; i < 5; ++i)
-            WriteFile(scratch + "/" + paper.first + "/" + std::to_string(i) + ".eps", label);
-    for (const auto& paper : papers)
+    for (const auto& [name, paper] : papers)
+        for (const char* file : {"/one.eps", "/two.eps"})
+            WriteFile(scratch + "/" + name + file, label);
+    for (const auto& [name, paper] : papers)
     {
-        const std::string output = scratch + "/" + paper.first + "/Output/";
-        ASSERT_TRUE(WaitFor([&] { return ListDirectory(output).size() == 10; }, 10000))
-            << paper.first << "\n"
-            << host->Err();
-        for (int i = 0; i < 5; ++i)
-            EXPECT_NE(ReadFile(output + std::to_string(i) + ".ps.Folder.cfg")
-                          .find("Value=\"" + paper.second + "\""),
-                      std::string::npos)
-                << paper.first;
+        const std::string output = scratch + "/" + name + "/Output/";
+        ASSERT_TRUE(WaitFor([&] { return ListDirectory(output).size() == 4; }, 10000)) << name;
+        EXPECT_NE(ReadFile(output + "two.ps.Folder.cfg").find("Value=\"" + paper + "\""),
+                  std::string::npos)
+            << name;
     }
 
     // Added while serving: picked up. Removed: no longer watched.
-    const std::string added = MakeFolder("added");
+    const std::string added = MakePostScriptFolder("A4", "added");
     ASSERT_TRUE(WaitFor([&] { return Count(host->Err(), "<6>serving " + added) >= 1; }, 10000));
     std::this_thread::sleep_for(std::chrono::milliseconds(300)); // its settings, made after init
     WriteFile(added + "/new.eps", label);
@@ -122,22 +112,22 @@ TEST_F(ServiceTest, EachFolderByItsOwnSettingsAsTheListChanges)
 
 TEST_F(ServiceTest, BadInputIsReportedAndTheOthersGoOn)
 {
-    const std::string good = MakeFolder("good");
-    const std::string doomed = MakeFolder("doomed");
+    const std::string good = MakePostScriptFolder("A4", "good");
+    const std::string doomed = MakePostScriptFolder("A4", "doomed");
     std::string list = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<HotFolderList>\n";
     for (const std::string& path :
          {good, doomed, scratch + "/plain-file", scratch + "/loop", scratch + "/broken"})
         list += "  <HotFolder path=\"" + path + "\"/>\n";
     WriteFile(scratch + "/plain-file", "x");
     ASSERT_EQ(symlink((scratch + "/loop").c_str(), (scratch + "/loop").c_str()), 0);
-    const std::string broken = MakeFolder("broken");
+    const std::string broken = MakePostScriptFolder("A4", "broken");
     WriteFile(Container(broken) + "/Folder.cfg", "<HotFolder");
     WriteFile(Warehouse() + "/HotFolderList.cfg", list + "</HotFolderList>\n");
 
     auto host = Serve(2);
-    for (const std::string& line : DataLines("bad-input.txt"))
+    for (const testkit::CaseFields& row : testkit::ReadCaseTable("service/bad-input.txt"))
     {
-        const std::string kind = line.substr(0, line.find(' '));
+        const std::string &kind = row[0], &line = row.back();
         if (kind == "list-file" || kind == "symlink-loop" || kind == "broken-config")
         {
             const std::string path = scratch + (kind == "list-file"      ? "/plain-file"
@@ -147,7 +137,7 @@ TEST_F(ServiceTest, BadInputIsReportedAndTheOthersGoOn)
         }
         else if (kind == "deleted")
         {
-            nftw(doomed.c_str(), RemoveEntry, 16, FTW_DEPTH | FTW_PHYS);
+            testkit::RunProgram({"rm", "-rf", doomed});
             EXPECT_TRUE(WaitFor(
                 [&] { return host->Err().find(doomed + " vanished") != std::string::npos; }, 5000))
                 << host->Err();
@@ -172,15 +162,18 @@ TEST_F(ServiceTest, BadInputIsReportedAndTheOthersGoOn)
 
 TEST_F(ServiceTest, StatusRemoveAndStop)
 {
-    const std::string a4 = MakeFolder("a4");
-    const std::string letter = MakeFolder("letter", "Letter");
+    const std::string a4 = MakePostScriptFolder("A4", "a4");
+    const std::string letter = MakePostScriptFolder("Letter", "letter");
     EXPECT_NE(Host({"status"}).out.find("not running"), std::string::npos);
     {
         auto host = Serve(2);
         WriteFile(a4 + "/one.eps", label);
         // What failed jobs leave: lines in the failure log, one of them old.
+        char now[32];
+        const time_t clock = time(nullptr);
+        strftime(now, sizeof now, "%Y-%m-%d %H:%M:%S", localtime(&clock));
         WriteFile(Failed(a4) + "/failed-jobs.log",
-                  "2001-01-01 10:00:00\told.eps\tInvalid input file (-1005)\n" + Now() +
+                  "2001-01-01 10:00:00\told.eps\tInvalid input file (-1005)\n" + std::string(now) +
                       "\tbad.eps\tInvalid input file (-1005)\n");
         ASSERT_TRUE(WaitFor([&] { return ListDirectory(Kept(a4)).size() == 1; }, 10000))
             << host->Err();
@@ -202,6 +195,11 @@ TEST_F(ServiceTest, StatusRemoveAndStop)
     EXPECT_NE(Host({"status"}).out.find("Service:       not running"), std::string::npos);
 
     auto host = Serve(2);
+    // One service at a time.
+    mkdir((scratch + "/second").c_str(), 0755);
+    BackgroundHost second({"serve"}, scratch + "/second");
+    EXPECT_EQ(second.Wait(5000), 3);
+    EXPECT_EQ(second.Err(), "<3>a hot-folder service is running already\n");
     // StopHF pauses every folder until it goes.
     WriteFile(Warehouse() + "/StopHF", "");
     ASSERT_TRUE(WaitFor([&] { return host->Err().find("paused") != std::string::npos; }, 5000));

@@ -1,7 +1,9 @@
 #pragma once
 // Scratch hot folders served by the built hotfolder.
-#include <memory>
+#include <dirent.h>
+
 #include <set>
+#include <thread>
 
 #include "HostTestSupport.h"
 
@@ -9,41 +11,41 @@ namespace service_test
 {
 using namespace host_test;
 
-inline const std::string kTrailer = "%%Trailer\r\n%%EOF\r\n";
-
 inline bool EndsWith(const std::string& text, const std::string& tail)
 {
     return text.size() >= tail.size() &&
            text.compare(text.size() - tail.size(), tail.size(), tail) == 0;
 }
 
-// Lines of a data file, without comments and blank lines.
-inline std::vector<std::string> DataLines(const std::string& name)
+inline size_t Count(const std::string& text, const std::string& part)
 {
-    std::ifstream file(std::string(HF_TEST_DATA_DIR) + "/service/" + name);
-    std::vector<std::string> lines;
-    for (std::string line; std::getline(file, line);)
-        if (!line.empty() && line[0] != '#')
-            lines.push_back(line);
-    return lines;
+    size_t count = 0;
+    for (size_t at = text.find(part); at != std::string::npos; at = text.find(part, at + 1))
+        ++count;
+    return count;
+}
+
+// Every entry of a folder, hidden ones too (staged leftovers are hidden).
+inline std::vector<std::string> AllEntries(const std::string& directory)
+{
+    std::vector<std::string> names;
+    if (DIR* dir = opendir(directory.c_str()))
+    {
+        while (dirent* entry = readdir(dir))
+            if (std::string(entry->d_name) != "." && std::string(entry->d_name) != "..")
+                names.push_back(entry->d_name);
+        closedir(dir);
+    }
+    std::sort(names.begin(), names.end());
+    return names;
 }
 
 class ServiceTest : public HostTest
 {
 protected:
-    // A hot folder converting to PostScript on paper.
-    std::string MakeFolder(const std::string& name, const std::string& paper = "A4")
-    {
-        const std::string folder = scratch + "/" + name;
-        EXPECT_EQ(Host({"init", folder, "--server", kServer}).exitCode, 0);
-        EXPECT_EQ(Host({"settings", folder, "--set", "OUTPUTFILETYPEEPS=0", "OUTPUTFILETYPEPS=1",
-                        "DEFAULTPAGESIZE=" + paper})
-                      .exitCode,
-                  0);
-        return folder;
-    }
-
-    // A service on the scratch warehouse, once it serves count folders.
+    // A service on the scratch warehouse, once it serves count folders. Its
+    // standard error is a file, not a terminal: every line starts with its
+    // severity for the journal ("<3>" error, "<4>" warning, "<6>" info).
     std::unique_ptr<BackgroundHost> Serve(size_t count, const std::string& settleMs = "200")
     {
         auto host = std::make_unique<BackgroundHost>(
@@ -53,30 +55,7 @@ protected:
         return host;
     }
 
-    static size_t Count(const std::string& text, const std::string& part)
-    {
-        size_t count = 0;
-        for (size_t at = text.find(part); at != std::string::npos; at = text.find(part, at + 1))
-            ++count;
-        return count;
-    }
-
     std::string Work(const std::string& folder) { return Container(folder) + "/[WorkFolder]"; }
-
-    // Every entry of the output folder, hidden ones too.
-    static std::vector<std::string> AllEntries(const std::string& directory)
-    {
-        std::vector<std::string> names;
-        if (DIR* dir = opendir(directory.c_str()))
-        {
-            while (dirent* entry = readdir(dir))
-                if (std::string(entry->d_name) != "." && std::string(entry->d_name) != "..")
-                    names.push_back(entry->d_name);
-            closedir(dir);
-        }
-        std::sort(names.begin(), names.end());
-        return names;
-    }
 
     const std::string label = ReadFile(kExamples + "/eps/label.eps");
 };
