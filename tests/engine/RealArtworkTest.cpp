@@ -35,17 +35,16 @@ std::vector<std::string> InstalledArtwork()
 
 EPStoPSparams_t A4Centred()
 {
-    EPStoPSparams_t p = NoParams();
-    p.pageWidth = 595;
-    p.pageHeight = 842;
-    p.imageableLLX = p.imageableLLY = 18;
-    p.imageableURX = 577;
-    p.imageableURY = 824;
-    p.imagePosition = IMG_POS_CENTER;
-    p.customSize = p.autoScale = p.fitToPage = true;
-    static char setPageDevice[] = "<< /PageSize [595 842] >> setpagedevice";
-    p.setPageDeviceString = setPageDevice;
-    return p;
+    static std::string spd;
+    return Params("page 595 842; area 18 18 577 824; pos 4; auto; fit; "
+                  "spd << /PageSize [595 842] >> setpagedevice",
+                  spd);
+}
+
+EPStoPSparams_t Original()
+{
+    static std::string spd;
+    return Params("", spd);
 }
 
 std::string BaseName(const std::string& path)
@@ -61,16 +60,16 @@ TEST(RealArtwork, ConvertsAndRendersWithoutError)
     const std::vector<std::string> artwork = InstalledArtwork();
     if (artwork.empty())
         GTEST_SKIP() << "no EPS artwork installed (ghostscript examples or Tk images)";
-    ScratchDir scratch;
+    testkit::ScratchDir scratch("hf-artwork");
     for (const std::string& eps : artwork)
     {
         SCOPED_TRACE(eps);
-        const Fingerprint before = TakeFingerprint(eps);
+        const std::string before = Fingerprint(eps);
         const std::string original = scratch.File(BaseName(eps) + ".orig.ps");
         const std::string onA4 = scratch.File(BaseName(eps) + ".a4.ps");
-        ASSERT_EQ(DetectAndConvert(eps, NoParams(), original), 1);
+        ASSERT_EQ(DetectAndConvert(eps, Original(), original), 1);
         ASSERT_EQ(DetectAndConvert(eps, A4Centred(), onA4), 1);
-        EXPECT_TRUE(TakeFingerprint(eps) == before);
+        EXPECT_TRUE(Fingerprint(eps) == before);
 
         // Original size: the page is the picture, the marks lie on it.
         const GhostscriptReport own = RunGhostscriptBBox(original);
@@ -100,13 +99,13 @@ TEST(RealArtwork, DosBinaryFromEpstoolGivesThePostScriptSectionOnly)
     const std::vector<std::string> artwork = InstalledArtwork();
     if (artwork.empty())
         GTEST_SKIP() << "no EPS artwork installed (ghostscript examples or Tk images)";
-    ScratchDir scratch;
+    testkit::ScratchDir scratch("hf-artwork");
     for (const std::string& eps : artwork)
     {
         SCOPED_TRACE(eps);
         const std::string wrapped = scratch.File(BaseName(eps) + ".dos.eps");
-        const testkit::ProcessResult made =
-            testkit::RunProgram({"epstool", "--add-tiff-preview", "--device", "tiffg3", eps, wrapped});
+        const testkit::ProcessResult made = testkit::RunProgram(
+            {"epstool", "--add-tiff-preview", "--device", "tiffg3", eps, wrapped});
         ASSERT_EQ(made.exitCode, 0) << made.err;
         const std::string dosBytes = testkit::ReadFile(wrapped);
         ASSERT_GE(dosBytes.size(), 30u);
@@ -134,7 +133,7 @@ TEST(RealArtwork, DosBinaryFromEpstoolGivesThePostScriptSectionOnly)
         // epstool rewrites the header comments (it rounds the high-resolution
         // box), so the same page comes from its section saved as a plain file.
         const std::string sectionFile = scratch.File("section.eps");
-        WriteBytes(sectionFile, section);
+        testkit::WriteFile(sectionFile, section);
         const std::string fromSection = scratch.File("section.ps");
         ASSERT_EQ(DetectAndConvert(sectionFile, A4Centred(), fromSection), 1);
         const std::string sectionRaster = RenderToPgm(fromSection, 36);
