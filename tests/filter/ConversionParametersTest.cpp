@@ -1,8 +1,6 @@
 // Settings text to converter parameters over the table
 // tests/data/filter/parameters.txt.
-#include <functional>
 #include <locale>
-#include <map>
 #include <sstream>
 #include <string>
 #include <vector>
@@ -32,43 +30,31 @@ std::vector<std::string> Split(const std::string& text, const std::string& separ
 std::string Field(EPS& eps, const std::string& name)
 {
     const EPStoPSparams_t& p = eps.GetParams();
-    const std::map<std::string, std::function<double()>> numbers = {
-        {"pageWidth", [&] { return p.pageWidth; }},
-        {"pageHeight", [&] { return p.pageHeight; }},
-        {"imageableLLX", [&] { return p.imageableLLX; }},
-        {"imageableLLY", [&] { return p.imageableLLY; }},
-        {"imageableURX", [&] { return p.imageableURX; }},
-        {"imageableURY", [&] { return p.imageableURY; }},
-        {"imageWidth", [&] { return p.imageWidth; }},
-        {"imageHeight", [&] { return p.imageHeight; }},
-        {"imagePosition", [&] { return p.imagePosition; }},
-        {"customSize", [&] { return p.customSize; }},
-        {"autoScale", [&] { return p.autoScale; }},
-        {"fitToPage", [&] { return p.fitToPage; }},
-        {"shrinkToFit", [&] { return p.shrinkToFit; }},
-        {"scaleToPrintable", [&] { return p.scaleToPrintable; }},
-        {"autoRotate", [&] { return p.autoRotate; }},
-        {"constrainProportions", [&] { return p.constrainProportions; }},
-        {"widthGiven", [&] { return p.widthGiven; }},
-        {"heightGiven", [&] { return p.heightGiven; }},
-        {"settings", [&] { return eps.GetSettings().size(); }},
-        {"status", [&] { return eps.GetStatus(); }},
-    };
     if (name == "spd")
         return p.setPageDeviceString ? p.setPageDeviceString : "(null)";
     if (name.rfind("setting:", 0) == 0)
         return eps.GetSettings()[name.substr(8)].ToStdString();
     if (name.rfind("has:", 0) == 0)
         return std::to_string(eps.GetSettings().count(name.substr(4)));
-    const auto number = numbers.find(name);
-    if (number == numbers.end())
+    std::ostringstream all;
+    all.imbue(std::locale::classic());
+    all.precision(12); // 25.4 mm may come out a rounding step away from 72
+    all << " pageWidth=" << p.pageWidth << " pageHeight=" << p.pageHeight
+        << " imageableLLX=" << p.imageableLLX << " imageableLLY=" << p.imageableLLY
+        << " imageableURX=" << p.imageableURX << " imageableURY=" << p.imageableURY
+        << " imageWidth=" << p.imageWidth << " imageHeight=" << p.imageHeight
+        << " imagePosition=" << p.imagePosition << " customSize=" << p.customSize
+        << " autoScale=" << p.autoScale << " fitToPage=" << p.fitToPage
+        << " shrinkToFit=" << p.shrinkToFit << " scaleToPrintable=" << p.scaleToPrintable
+        << " autoRotate=" << p.autoRotate << " constrainProportions=" << p.constrainProportions
+        << " widthGiven=" << p.widthGiven << " heightGiven=" << p.heightGiven
+        << " settings=" << eps.GetSettings().size() << " status=" << eps.GetStatus() << " ";
+    const std::string text = all.str();
+    const size_t at = text.find(" " + name + "=");
+    if (at == std::string::npos)
         return "unknown field " + name;
-    // Twelve digits: 25.4 mm may come out a rounding step away from 72.
-    std::ostringstream text;
-    text.imbue(std::locale::classic());
-    text.precision(12);
-    text << number->second();
-    return text.str();
+    const size_t start = at + name.size() + 2;
+    return text.substr(start, text.find(' ', start) - start);
 }
 
 void RunTable(bool decimalComma)

@@ -1,6 +1,8 @@
 // The whole road of jobs through the loaded module, as a host drives it:
 // dlopen, initialise with a server description, load the folder's filter
 // node, sniff, process with progress, and look at what came out.
+#include <sstream>
+
 #include <gtest/gtest.h>
 #include <wx/dir.h>
 #include <wx/filename.h>
@@ -29,12 +31,13 @@ protected:
         WriteEmptyFolderConfig(out.File("Folder.cfg"));
     }
     // The folder's filter node as the host keeps it in Folder.cfg.
-    void LoadSettings(std::initializer_list<std::pair<const char*, const char*>> settings)
+    void LoadSettings(const std::string& settings) // "KEY=value; ..."
     {
         wxXmlNode filter(wxXML_ELEMENT_NODE, "Filter");
         auto* ui = new wxXmlNode(&filter, wxXML_ELEMENT_NODE, "UI");
-        for (const auto& [key, value] : settings)
-            AddSetting(ui, key, value);
+        std::istringstream items(settings);
+        for (std::string item; std::getline(items >> std::ws, item, ';');)
+            AddSetting(ui, item.substr(0, item.find('=')), item.substr(item.find('=') + 1));
         ASSERT_EQ(plugin->Initialize(kServer), 0);
         ASSERT_EQ(plugin->InitilaizeFromPreference(&filter), 0);
     }
@@ -58,35 +61,14 @@ TEST_F(Host, FolderOfMixedFilesToPlacedPages)
     }
     testkit::WriteFile(hot.File("letter.eps"), "Dear printer,\nthis is not PostScript.\n");
     testkit::WriteFile(hot.File("notes.txt"), "notes\n");
-    testkit::WriteFile(hot.Sub("ppml") + "/job.ppml", "<PPML/>");
-    LoadSettings({{"OUTPUTFILETYPEEPS", "0"},
-                  {"ORIGINALSIZE", "1"},
-                  {"DEFAULTPAGESIZE", "Letter"},
-                  {"PAGESIZE_COMMAND", "<</PageSize [612 792]>> setpagedevice"},
-                  {"FORCEPAGESIZEX", "612"},
-                  {"FORCEPAGESIZEY", "792"},
-                  {"IMAGEEABLESIZELLX", "18"},
-                  {"IMAGEEABLESIZELLY", "18"},
-                  {"IMAGEEABLESIZEURX", "594"},
-                  {"IMAGEEABLESIZEURY", "774"},
-                  {"IMAGEPOSITION", "Top Left"}});
+    LoadSettings("OUTPUTFILETYPEEPS=0; ORIGINALSIZE=1; DEFAULTPAGESIZE=Letter; "
+                 "PAGESIZE_COMMAND=<</PageSize [612 792]>> setpagedevice; FORCEPAGESIZEX=612; "
+                 "FORCEPAGESIZEY=792; IMAGEEABLESIZELLX=18; IMAGEEABLESIZELLY=18; "
+                 "IMAGEEABLESIZEURX=594; IMAGEEABLESIZEURY=774; IMAGEPOSITION=Top Left");
 
-    // While the folder holds a PPML job, the filter leaves it alone, or
-    // refuses it whole when the host lists it.
+    // The .eps that is no EPS is dropped, the text file refused.
     wxArrayString rejected;
     JobInfoCollection jobs;
-    ASSERT_EQ(plugin->SniffFolder(hot.Path(), rejected, jobs), 0);
-    EXPECT_EQ(jobs.GetCount() + rejected.size(), 0u);
-    FolderContent content;
-    wxDir::GetAllFiles(hot.Path(), &content.m_arrFiles, "", wxDIR_FILES);
-    FolderContent* listing = &content;
-    ASSERT_EQ(plugin->SniffFolder(hot.Path(), rejected, jobs, listing), 0);
-    EXPECT_EQ(rejected, content.m_arrFiles);
-    EXPECT_EQ(jobs.GetCount(), 0u);
-
-    // The PPML job leaves; now the artwork is taken.
-    wxRemoveFile(hot.File("ppml/job.ppml"));
-    rejected.clear();
     ASSERT_EQ(plugin->SniffFolder(hot.Path(), rejected, jobs), 0);
     ASSERT_EQ(rejected.size(), 1u);
     EXPECT_EQ(wxFileName(rejected[0]).GetFullName(), "notes.txt");
@@ -120,30 +102,4 @@ TEST_F(Host, FolderOfMixedFilesToPlacedPages)
     const auto overrides = FolderOverrides(out.File("Folder.cfg"));
     ASSERT_EQ(overrides.size(), 1u);
     EXPECT_EQ(overrides.at("PageSize").GetValue(), "Letter");
-
-    // An .eps that is not EPS fails the job with its own text.
-    ReadyToProcessJobInfo fake;
-    fake.filterId = "Orv.EPS.1";
-    fake.files.Add(hot.File("letter.eps"));
-    wxString name, message;
-    const long status = plugin->Process("", fake, out.Path(), name, nullptr);
-    EXPECT_EQ(status, -1005);
-    plugin->GetErrorString(status, message);
-    EXPECT_EQ(message, "Invalid input file");
-}
-
-TEST_F(Host, PassThroughReportsTheInputAndWritesNothing)
-{
-    testkit::WriteFile(hot.File("a.eps"), sample::RectangleEps(0, 0, 10, 10));
-    LoadSettings({{"OUTPUTFILETYPEEPS", "1"}, {"DEFAULTPAGESIZE", "A4"}});
-    wxArrayString files, second, rejected;
-    files.Add(hot.File("a.eps"));
-    JobInfoCollection jobs;
-    ASSERT_EQ(plugin->SniffFiles(files, second, rejected, jobs), 0);
-    ASSERT_EQ(jobs.GetCount(), 1u);
-    wxString name;
-    EXPECT_EQ(plugin->Process("", jobs[0], out.Path(), name, nullptr), 0);
-    EXPECT_EQ(name, "a.eps");
-    EXPECT_FALSE(testkit::Exists(out.File("a.ps")));
-    EXPECT_TRUE(FolderOverrides(out.File("Folder.cfg")).empty());
 }

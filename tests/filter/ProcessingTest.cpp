@@ -101,25 +101,3 @@ TEST(Processing, TableOfJobs)
         EXPECT_EQ(overrides.empty() ? "-" : overrides, c[7]);
     }
 }
-
-TEST(Processing, DecimalCommaLanguageStillWritesPoints)
-{
-    // What a German application language leaves behind: a decimal-comma C
-    // locale. The stored settings keep their points.
-    TESTKIT_USE_LOCALE(german, "de_DE.UTF-8");
-    testkit::ScratchDir in("hf-jobs-in"), out("hf-jobs-out");
-    EPS eps("x");
-    SetUpFilter(eps, {{"IMAGEEABLESIZELLX", "12.5"},
-                      {"IMAGEEABLESIZELLY", "12.5"},
-                      {"IMAGEEABLESIZEURX", "582.5"},
-                      {"IMAGEEABLESIZEURY", "829.5"}});
-    ReadyToProcessJobInfo job;
-    job.filterId = "Orv.EPS.1";
-    job.files.Add(in.File("komma.eps"));
-    testkit::WriteFile(in.File("komma.eps"), sample::RectangleEps(0, 0, 200, 100));
-    wxString name;
-    ASSERT_EQ(eps.Process("", job, out.Path(), name, nullptr), 0);
-    const std::string ps = testkit::ReadFile(out.File("komma.ps"));
-    EXPECT_NE(ps.find("%%HiResBoundingBox: 12.5 12.5 582.5 829.5\r\n"), std::string::npos);
-    EXPECT_EQ(ps.find("12,5"), std::string::npos);
-}

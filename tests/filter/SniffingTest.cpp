@@ -15,59 +15,44 @@
 
 namespace
 {
-// {N*TEXT} repeated and \xHH bytes decoded.
-std::string Expand(const std::string& text)
-{
-    std::string out;
-    for (size_t i = 0; i < text.size(); ++i)
-    {
-        if (text.compare(i, 2, "\\x") == 0)
-        {
-            out += static_cast<char>(std::stoi(text.substr(i + 2, 2), nullptr, 16));
-            i += 3;
-        }
-        else if (text[i] == '{')
-        {
-            const size_t star = text.find('*', i), close = text.find('}', i);
-            for (int n = std::stoi(text.substr(i + 1, star - i - 1)); n > 0; --n)
-                out += text.substr(star + 1, close - star - 1);
-            i = close;
-        }
-        else
-            out += text[i];
-    }
-    return out;
-}
+const std::string kEps = sample::RectangleEps(0, 0, 100, 50);
+const std::string kFake = "%!PS-Adobe-3.0\nnot encapsulated\n";
 
+// The words of a table field, {N*TEXT} repeated and \xHH bytes decoded.
 std::vector<std::string> Words(const std::string& text)
 {
-    std::istringstream in(text);
+    std::string expanded;
+    for (size_t i = 0; i < text.size(); ++i)
+    {
+        const size_t star = text.find('*', i), close = text.find('}', i);
+        if (text.compare(i, 2, "\\x") == 0)
+            expanded += static_cast<char>(std::stoi(text.substr(i + 2, 2), nullptr, 16));
+        else if (text[i] == '{')
+            for (int n = std::stoi(text.substr(i + 1, star - i - 1)); n > 0; --n)
+                expanded += text.substr(star + 1, close - star - 1);
+        else
+            expanded += text[i];
+        i = text[i] == '{' ? close : text.compare(i, 2, "\\x") == 0 ? i + 3 : i;
+    }
+    std::istringstream in(expanded);
     std::vector<std::string> words;
     for (std::string word; in >> word;)
-        words.push_back(Expand(word));
+        words.push_back(word);
     return words;
 }
 
 void MakeEntry(const testkit::ScratchDir& dir, const std::string& entry)
 {
     const size_t arrow = entry.find("->"), equals = entry.find('=');
+    const std::string name = entry.substr(0, std::min(arrow, equals));
     if (arrow != std::string::npos)
-        ASSERT_EQ(
-            symlink(entry.substr(arrow + 2).c_str(), dir.File(entry.substr(0, arrow)).c_str()), 0);
+        ASSERT_EQ(symlink(entry.substr(arrow + 2).c_str(), dir.File(name).c_str()), 0);
     else if (entry.back() == '/')
         dir.Sub(entry.substr(0, entry.size() - 1));
     else
-    {
-        const std::string name = entry.substr(0, equals);
-        std::string kind = equals == std::string::npos ? "" : entry.substr(equals + 1);
-        std::string lower = name.substr(std::max<size_t>(name.size(), 4) - 4);
-        std::transform(lower.begin(), lower.end(), lower.begin(), ::tolower);
-        if (kind.empty())
-            kind = lower == ".eps" ? "eps" : "text";
-        testkit::WriteFile(dir.File(name), kind == "eps"    ? sample::RectangleEps(0, 0, 100, 50)
-                                           : kind == "fake" ? "%!PS-Adobe-3.0\nnot encapsulated\n"
-                                                            : "hello\n");
-    }
+        testkit::WriteFile(dir.File(name), entry.substr(name.size()) == "=text"   ? "hello\n"
+                                           : entry.substr(name.size()) == "=fake" ? kFake
+                                                                                  : kEps);
 }
 
 // Paths as names inside the folder, "-" for none.
