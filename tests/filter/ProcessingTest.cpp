@@ -1,5 +1,7 @@
 // Jobs through the converter: results, outputs, progress and job overrides
 // over the table tests/data/filter/processing.txt.
+#include <unistd.h>
+
 #include <sstream>
 #include <string>
 
@@ -45,7 +47,7 @@ TEST(Processing, TableOfJobs)
         ASSERT_EQ(c.size(), 8u) << c[0];
         SCOPED_TRACE(c[0]);
         testkit::ScratchDir in("hf-jobs-in"), out("hf-jobs-out");
-        const wxString config = out.File("Folder.cfg");
+        const std::string config = out.File("Folder.cfg");
         hf_test::WriteEmptyFolderConfig(config, "folder");
         EPS eps("x");
         ReadyToProcessJobInfo job;
@@ -59,7 +61,7 @@ TEST(Processing, TableOfJobs)
             else if (item == "substrate")
                 eps.Initialize("<S><SubstrateFamilySupported>yes</SubstrateFamilySupported></S>");
             else if (item == "no-config")
-                wxRemoveFile(config);
+                unlink(config.c_str());
             else if (item == "no-filter-id")
                 job.filterId.clear();
             else if (item.rfind("blocked ", 0) == 0)

@@ -10,6 +10,7 @@
 #include "PpdSources.h"
 #include "PrivateCupsd.h"
 #include "SampleEps.h"
+#include "TestKit.h"
 
 using printing::SubmitToCups;
 
@@ -34,10 +35,10 @@ protected:
             GTEST_SKIP() << "cupsd or lpadmin missing (packages cups-daemon, cups-client)";
         if (access(kFilter, X_OK) != 0)
             GTEST_SKIP() << kFilter << " missing (package cups-core-drivers)";
-        scheduler = std::make_unique<cups_test::PrivateCupsd>(scratch.Path().ToStdString());
+        scheduler = std::make_unique<cups_test::PrivateCupsd>(scratch.Path());
         std::string problem;
         ASSERT_TRUE(scheduler->Start(problem)) << problem;
-        device = scratch.File("device.ps").ToStdString();
+        device = scratch.File("device.ps");
         ASSERT_TRUE(scheduler->AddFileQueue(kQueue, ppd_sources::TestPpd(), device, problem))
             << problem;
         cupsSetServer(scheduler->Server().c_str());
@@ -50,12 +51,12 @@ protected:
 
     std::string Artwork(const std::string& name, const std::string& marker)
     {
-        const std::string path = scratch.File(name).ToStdString();
-        sample::WriteFile(path, "%!PS-Adobe-3.0\n%%BoundingBox: 0 0 72 72\n%%Pages: 1\n"
-                                "%%EndComments\n%%Page: 1 1\n(" +
-                                    marker +
-                                    ") pop\nnewpath 0 0 moveto 72 72 lineto stroke\n"
-                                    "showpage\n%%EOF\n");
+        const std::string path = scratch.File(name);
+        testkit::WriteFile(path, "%!PS-Adobe-3.0\n%%BoundingBox: 0 0 72 72\n%%Pages: 1\n"
+                                 "%%EndComments\n%%Page: 1 1\n(" +
+                                     marker +
+                                     ") pop\nnewpath 0 0 moveto 72 72 lineto stroke\n"
+                                     "showpage\n%%EOF\n");
         return path;
     }
 
@@ -102,7 +103,7 @@ protected:
         return count;
     }
 
-    sample::ScratchDir scratch;
+    testkit::ScratchDir scratch;
     std::unique_ptr<cups_test::PrivateCupsd> scheduler;
     std::string device;
 };
@@ -157,7 +158,7 @@ TEST_F(CupsSubmission, FailuresSayWhyAndLeaveNoJob)
     EXPECT_NE(error.find("no_such_queue"), std::string::npos) << error;
 
     error.clear();
-    EXPECT_FALSE(SubmitToCups(kQueue, scratch.File("missing.ps").ToStdString(), "m", {}, error));
+    EXPECT_FALSE(SubmitToCups(kQueue, scratch.File("missing.ps"), "m", {}, error));
     EXPECT_NE(error.find("missing.ps"), std::string::npos) << error;
     EXPECT_EQ(JobsOnQueue(), 0);
 

@@ -12,6 +12,7 @@
 #include "PageSizeKeys.h"
 #include "PpdSources.h"
 #include "SampleEps.h"
+#include "TestKit.h"
 #include "ServerFromPpd.h"
 #include "db/PluginInitialize.h"
 
@@ -32,8 +33,8 @@ hf_test::GhostscriptReport RunOnPrinter(const wxString& psFile, const wxString& 
     if (command.Find("/HPDict") == wxNOT_FOUND)
         return hf_test::RunGhostscriptBBox(psFile.ToStdString());
     const wxString withPrinter = psFile + ".printer.ps";
-    sample::WriteFile(withPrinter,
-                      kHpResidentProcSet + testkit::ReadFile(psFile.ToStdString()));
+    testkit::WriteFile(withPrinter.ToStdString(),
+                       kHpResidentProcSet + testkit::ReadFile(psFile.ToStdString()));
     return hf_test::RunGhostscriptBBox(withPrinter.ToStdString());
 }
 
@@ -76,8 +77,8 @@ protected:
     // printer-side stand-ins Ghostscript needs.
     void Convert(const wxString& command, Outcome& outcome)
     {
-        sample::ScratchDir hot, out;
-        ASSERT_TRUE(sample::WriteFile(hot.File("art.eps"), sample::RectangleEps(0, 0, 72, 36)));
+        testkit::ScratchDir hot, out;
+        ASSERT_TRUE(testkit::WriteFile(hot.File("art.eps"), sample::RectangleEps(0, 0, 72, 36)));
         hf_test::WriteEmptyFolderConfig(out.File("Folder.cfg"));
 
         wxArrayString files, second, rejected;
@@ -87,7 +88,7 @@ protected:
         ASSERT_EQ(jobs.GetCount(), 1u);
         wxString outputName;
         ASSERT_EQ(plugin->Process("", jobs[0], out.Path(), outputName, nullptr), 0);
-        outcome.gs = RunOnPrinter(out.File(outputName), command);
+        outcome.gs = RunOnPrinter(out.File(outputName.ToStdString()), command);
 
         printing::OptionList pairs;
         for (const auto& [key, property] : hf_test::FolderOverrides(out.File("Folder.cfg")))
@@ -163,8 +164,8 @@ TEST_F(PaperConversion, A4ThroughEachDescriptionOfTheTable)
 
 TEST_F(PaperConversion, GenericPostScriptPrinterPapers)
 {
-    sample::ScratchDir dir;
-    const std::string ppd = ppd_sources::GenericPostScriptPpd(dir.Path().ToStdString());
+    testkit::ScratchDir dir;
+    const std::string ppd = ppd_sources::GenericPostScriptPpd(dir.Path());
     if (ppd.empty())
         GTEST_SKIP() << "ppdc or " << ppd_sources::kSampleDriver << " missing";
     EXPECT_EQ(ConvertOnPapers(ppd, {"Letter", "A4", "A5", "Env10"}), 4u);
@@ -172,8 +173,8 @@ TEST_F(PaperConversion, GenericPostScriptPrinterPapers)
 
 TEST_F(PaperConversion, HpPrinterPapers)
 {
-    sample::ScratchDir dir;
-    const auto ppds = ppd_sources::HpPpds(dir.Path().ToStdString(), 3);
+    testkit::ScratchDir dir;
+    const auto ppds = ppd_sources::HpPpds(dir.Path(), 3);
     if (ppds.empty())
         GTEST_SKIP() << ppd_sources::kHpArchive << " missing";
     for (const std::string& ppd : ppds)
@@ -184,10 +185,10 @@ TEST_F(PaperConversion, HpPrinterPapers)
 // dialog does, runs through the printer's own custom size code.
 TEST_F(PaperConversion, CustomSizesThroughThePrintersOwnCode)
 {
-    sample::ScratchDir dir;
+    testkit::ScratchDir dir;
     std::vector<std::string> ppds = {ppd_sources::TestPpd(),
                                      std::string(HF_TEST_DATA_DIR) + "/ppd/test-jcl-custom.ppd"};
-    for (const std::string& hp : ppd_sources::HpPpds(dir.Path().ToStdString(), 3))
+    for (const std::string& hp : ppd_sources::HpPpds(dir.Path(), 3))
         ppds.push_back(hp);
     size_t tried = 0;
     for (const std::string& ppd : ppds)

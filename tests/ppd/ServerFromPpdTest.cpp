@@ -12,6 +12,7 @@
 #include "PpdSources.h"
 #include "PpdTextReader.h"
 #include "SampleEps.h"
+#include "TestKit.h"
 #include "ServerFromPpd.h"
 #include "cli/Commands.h"
 #include "db/PluginInitialize.h"
@@ -244,8 +245,8 @@ TEST(ServerFromPpd, DescriptionsOfTheTable)
 
 TEST(ServerFromPpd, GenericPostScriptPrinterOfCups)
 {
-    sample::ScratchDir dir;
-    const std::string ppd = ppd_sources::GenericPostScriptPpd(dir.Path().ToStdString());
+    testkit::ScratchDir dir;
+    const std::string ppd = ppd_sources::GenericPostScriptPpd(dir.Path());
     if (ppd.empty())
         GTEST_SKIP() << "ppdc or " << ppd_sources::kSampleDriver
                      << " missing (packages cups-ppdc, cups-common)";
@@ -261,8 +262,8 @@ TEST(ServerFromPpd, GenericPostScriptPrinterOfCups)
 
 TEST(ServerFromPpd, HpPostScriptPrinters)
 {
-    sample::ScratchDir dir;
-    const auto ppds = ppd_sources::HpPpds(dir.Path().ToStdString(), 10);
+    testkit::ScratchDir dir;
+    const auto ppds = ppd_sources::HpPpds(dir.Path(), 10);
     if (ppds.empty())
         GTEST_SKIP() << ppd_sources::kHpArchive
                      << " missing (package printer-driver-postscript-hp)";
@@ -300,13 +301,13 @@ TEST(ServerFromPpd, NumbersUseFullStopUnderCommaLocale)
 
 TEST(ServerFromPpd, UnreadableDescriptionsFailAndLeaveTheOutputAlone)
 {
-    sample::ScratchDir dir;
-    const std::string notPpd = dir.File("letter.ppd").ToStdString();
-    sample::WriteFile(notPpd, "Dear printer,\nthis is not a description.\n");
-    const std::string noPageSize = dir.File("nopages.ppd").ToStdString();
-    sample::WriteFile(noPageSize, "*PPD-Adobe: \"4.3\"\n*FormatVersion: \"4.3\"\n"
-                                  "*ModelName: \"Blank\"\n*NickName: \"Blank\"\n");
-    for (const std::string& path : {dir.File("missing.ppd").ToStdString(), notPpd, noPageSize})
+    testkit::ScratchDir dir;
+    const std::string notPpd = dir.File("letter.ppd");
+    testkit::WriteFile(notPpd, "Dear printer,\nthis is not a description.\n");
+    const std::string noPageSize = dir.File("nopages.ppd");
+    testkit::WriteFile(noPageSize, "*PPD-Adobe: \"4.3\"\n*FormatVersion: \"4.3\"\n"
+                                   "*ModelName: \"Blank\"\n*NickName: \"Blank\"\n");
+    for (const std::string& path : {dir.File("missing.ppd"), notPpd, noPageSize})
     {
         wxString xml = "untouched";
         std::string error;
@@ -318,13 +319,13 @@ TEST(ServerFromPpd, UnreadableDescriptionsFailAndLeaveTheOutputAlone)
 
 TEST(ServerFromPpdCommand, WritesTheFileOrStandardOutput)
 {
-    sample::ScratchDir dir;
+    testkit::ScratchDir dir;
     wxString expected;
     std::string error;
     ASSERT_TRUE(ServerDescriptionFromPpd(ppd_sources::TestPpd(), expected, error));
 
-    const std::string target = dir.File("server.xml").ToStdString();
-    sample::WriteFile(target, "old");
+    const std::string target = dir.File("server.xml");
+    testkit::WriteFile(target, "old");
     EXPECT_EQ(RunServerFromPpdCommand({ppd_sources::TestPpd(), "-o", target}), 0);
     EXPECT_EQ(testkit::ReadFile(target), std::string(expected.utf8_str()));
     wxArrayString left;
@@ -348,14 +349,13 @@ TEST(ServerFromPpdCommand, UsageAndFailures)
     EXPECT_EQ(RunServerFromPpdCommand({"--colour", ppd_sources::TestPpd()}), 2);
 
     // A PPD that cannot be read leaves the old description in place.
-    sample::ScratchDir dir;
-    const std::string target = dir.File("server.xml").ToStdString();
-    sample::WriteFile(target, "old");
-    EXPECT_EQ(RunServerFromPpdCommand({dir.File("missing.ppd").ToStdString(), "-o", target}),
-              kExitSetupFailed);
+    testkit::ScratchDir dir;
+    const std::string target = dir.File("server.xml");
+    testkit::WriteFile(target, "old");
+    EXPECT_EQ(RunServerFromPpdCommand({dir.File("missing.ppd"), "-o", target}), kExitSetupFailed);
     EXPECT_EQ(testkit::ReadFile(target), "old");
     // So does an unwritable target.
-    EXPECT_EQ(RunServerFromPpdCommand(
-                  {ppd_sources::TestPpd(), "-o", dir.File("no/such/dir/server.xml").ToStdString()}),
-              1);
+    EXPECT_EQ(
+        RunServerFromPpdCommand({ppd_sources::TestPpd(), "-o", dir.File("no/such/dir/server.xml")}),
+        1);
 }
