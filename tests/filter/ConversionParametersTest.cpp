@@ -7,7 +7,6 @@
 
 #include <gtest/gtest.h>
 
-#include "CaseTable.h"
 #include "EPS.h"
 #include "TestKit.h"
 

@@ -108,6 +108,7 @@ TEST(Sniffing, TableOfFolders)
         else
             status = eps.SniffFolder(folder, rejected, jobs);
         EXPECT_EQ(std::to_string(status), c[5]);
+        EXPECT_EQ(what == "ppml" ? 0 : eps.GetStatus(), what == "ppml" ? 0 : status);
         EXPECT_EQ(Names(rejected, dir.Path(), what.rfind("folder", 0) == 0), c[4]);
 
         wxArrayString jobFiles;
