@@ -1,169 +1,60 @@
 #pragma once
-// Helpers shared by the engine tests: scratch folders, fixtures written on
-// the fly, standard-error capture and input fingerprints.
-#include <fcntl.h>
-#include <locale.h>
-#include <ftw.h>
+// What the engine tests share besides the test kit: EPS files written on the
+// fly, conversion records spelt as words, and input fingerprints.
 #include <sys/stat.h>
-#include <unistd.h>
 
-#include <cstdio>
-#include <cstdlib>
 #include <cstring>
-#include <fstream>
+#include <locale>
+#include <sstream>
 #include <string>
 
+#include <gtest/gtest.h>
+
 #include "EPStoPS.h"
-#include "GhostscriptOracle.h"
+#include "TestKit.h"
 
 namespace hf_test
 {
-class ScratchDir
+// A number as PostScript writes it, whatever locale a test switched to.
+inline std::string Num(double value)
 {
-public:
-    ScratchDir()
-    {
-        char name[] = "/tmp/hf-engine-XXXXXX";
-        m_path = mkdtemp(name) ? name : "";
-    }
-    ~ScratchDir()
-    {
-        if (!m_path.empty())
-            nftw(m_path.c_str(), RemoveOne, 16, FTW_DEPTH | FTW_PHYS);
-    }
-    ScratchDir(const ScratchDir&) = delete;
-    ScratchDir& operator=(const ScratchDir&) = delete;
+    std::ostringstream text;
+    text.imbue(std::locale::classic());
+    text.precision(17);
+    text << value;
+    return text.str();
+}
 
-    const std::string& Path() const { return m_path; }
-    std::string File(const std::string& name) const { return m_path + "/" + name; }
-
-private:
-    static int RemoveOne(const char* path, const struct stat*, int type, struct FTW*)
+// Table text to bytes: \n \r \t \0 \\ and \xHH.
+inline std::string Unescape(const std::string& text)
+{
+    std::string bytes;
+    for (size_t i = 0; i < text.size(); ++i)
     {
-        chmod(path, 0700);
-        if (type == FTW_DP)
-            rmdir(path);
+        if (text[i] != '\\' || i + 1 == text.size())
+        {
+            bytes += text[i];
+            continue;
+        }
+        const char c = text[++i];
+        if (c == 'x')
+        {
+            bytes += static_cast<char>(std::stoi(text.substr(i + 1, 2), nullptr, 16));
+            i += 2;
+        }
         else
-            unlink(path);
-        return 0;
+            bytes += c == 'n' ? '\n' : c == 'r' ? '\r' : c == 't' ? '\t' : c == '0' ? '\0' : c;
     }
-    std::string m_path;
-};
-
-inline void WriteBytes(const std::string& path, const std::string& bytes)
-{
-    std::ofstream out(path, std::ios::binary | std::ios::trunc);
-    out.write(bytes.data(), static_cast<std::streamsize>(bytes.size()));
+    return bytes;
 }
-
-// Collects what is written to standard error while it lives.
-class StderrCapture
-{
-public:
-    StderrCapture()
-    {
-        fflush(stderr);
-        char name[] = "/tmp/hf-engine-stderr-XXXXXX";
-        m_fd = mkstemp(name);
-        m_name = name;
-        m_saved = dup(2);
-        dup2(m_fd, 2);
-    }
-    ~StderrCapture() { Restore(); }
-    StderrCapture(const StderrCapture&) = delete;
-    StderrCapture& operator=(const StderrCapture&) = delete;
-
-    // Stops capturing and returns everything captured.
-    std::string Text()
-    {
-        Restore();
-        return m_text;
-    }
-
-private:
-    void Restore()
-    {
-        if (m_saved < 0)
-            return;
-        fflush(stderr);
-        dup2(m_saved, 2);
-        close(m_saved);
-        m_saved = -1;
-        close(m_fd);
-        m_text = testkit::ReadFile(m_name);
-        unlink(m_name.c_str());
-    }
-    int m_fd = -1;
-    int m_saved = -1;
-    std::string m_name;
-    std::string m_text;
-};
-
-// Size, modification time and content hash: an input file must never change.
-struct Fingerprint
-{
-    long long size = -1;
-    long long mtimeNs = -1;
-    unsigned long long hash = 0;
-    bool operator==(const Fingerprint& o) const
-    {
-        return size == o.size && mtimeNs == o.mtimeNs && hash == o.hash;
-    }
-};
-
-inline Fingerprint TakeFingerprint(const std::string& path)
-{
-    Fingerprint print;
-    struct stat info;
-    if (stat(path.c_str(), &info) != 0)
-        return print;
-    print.size = info.st_size;
-    print.mtimeNs = info.st_mtim.tv_sec * 1000000000LL + info.st_mtim.tv_nsec;
-    if (S_ISREG(info.st_mode))
-    {
-        unsigned long long hash = 1469598103934665603ULL; // FNV-1a
-        for (unsigned char c : testkit::ReadFile(path))
-            hash = (hash ^ c) * 1099511628211ULL;
-        print.hash = hash;
-    }
-    return print;
-}
-
-// Numbers in EPS files use "." whatever locale a test switched to.
-class CNumbers
-{
-public:
-    CNumbers() : m_c(newlocale(LC_ALL_MASK, "C", static_cast<locale_t>(nullptr)))
-    {
-        m_previous = uselocale(m_c);
-    }
-    ~CNumbers()
-    {
-        uselocale(m_previous);
-        freelocale(m_c);
-    }
-    CNumbers(const CNumbers&) = delete;
-    CNumbers& operator=(const CNumbers&) = delete;
-
-private:
-    locale_t m_c;
-    locale_t m_previous;
-};
 
 // An EPS program that fills exactly its bounding box.
 inline std::string FilledBoxEps(double llx, double lly, double urx, double ury)
 {
-    CNumbers cNumbers;
-    char text[1024];
-    std::snprintf(text, sizeof text,
-                  "%%!PS-Adobe-3.0 EPSF-3.0\n"
-                  "%%%%BoundingBox: %.17g %.17g %.17g %.17g\n"
-                  "%%%%EndComments\n"
-                  "newpath %.17g %.17g moveto %.17g %.17g lineto %.17g %.17g lineto "
-                  "%.17g %.17g lineto closepath fill\n"
-                  "%%%%EOF\n",
-                  llx, lly, urx, ury, llx, lly, urx, lly, urx, ury, llx, ury);
-    return text;
+    const std::string l = Num(llx), b = Num(lly), r = Num(urx), t = Num(ury);
+    return "%!PS-Adobe-3.0 EPSF-3.0\n%%BoundingBox: " + l + " " + b + " " + r + " " + t +
+           "\n%%EndComments\nnewpath " + l + " " + b + " moveto " + r + " " + b + " lineto " + r +
+           " " + t + " lineto " + l + " " + t + " lineto closepath fill\n%%EOF\n";
 }
 
 // The 30-byte DOS EPS binary header with the PostScript section's place.
@@ -176,11 +67,59 @@ inline std::string DosEpsHeader(uint32_t offset, uint32_t length)
     return header + "\xFF\xFF"; // checksum
 }
 
-inline EPStoPSparams_t NoParams()
+// A conversion record from words separated by "; ": "page W H", "area LLX
+// LLY URX URY", "pos N", "size W H", "auto" (custom size, scaled), "fit",
+// "shrink", "width" or "height" (proportions kept from that side), "spd TEXT".
+// The record points into spd, which must outlive it.
+inline EPStoPSparams_t Params(const std::string& words, std::string& spd)
 {
-    EPStoPSparams_t params;
-    std::memset(&params, 0, sizeof params);
-    return params;
+    EPStoPSparams_t p;
+    std::memset(&p, 0, sizeof p);
+    std::istringstream items(words);
+    items.imbue(std::locale::classic());
+    for (std::string item; std::getline(items, item, ';');)
+    {
+        std::istringstream in(item);
+        in.imbue(std::locale::classic());
+        std::string word;
+        in >> word;
+        if (word == "page")
+            in >> p.pageWidth >> p.pageHeight;
+        else if (word == "area")
+            in >> p.imageableLLX >> p.imageableLLY >> p.imageableURX >> p.imageableURY;
+        else if (word == "pos")
+            in >> p.imagePosition;
+        else if (word == "size")
+            in >> p.imageWidth >> p.imageHeight;
+        else if (word == "auto")
+            p.customSize = p.autoScale = true;
+        else if (word == "fit")
+            p.fitToPage = true;
+        else if (word == "shrink")
+            p.shrinkToFit = true;
+        else if (word == "width")
+            p.constrainProportions = p.widthGiven = true;
+        else if (word == "height")
+            p.constrainProportions = p.heightGiven = true;
+        else if (word == "spd")
+        {
+            std::getline(in >> std::ws, spd);
+            p.setPageDeviceString = spd.data();
+        }
+        else if (!word.empty())
+            ADD_FAILURE() << "unknown option " << word;
+    }
+    return p;
+}
+
+// Size, modification time and content: an input file must never change.
+inline std::string Fingerprint(const std::string& path)
+{
+    struct stat info;
+    if (stat(path.c_str(), &info) != 0)
+        return "missing";
+    return std::to_string(info.st_size) + "@" + std::to_string(info.st_mtim.tv_sec) + "." +
+           std::to_string(info.st_mtim.tv_nsec) + ":" + testkit::ReadFile(path);
 }
 
 // Detects and converts in one go; the result of ConvertEPStoPS, or -1 when

@@ -3,153 +3,99 @@
 #include <fcntl.h>
 #include <linux/fs.h>
 #include <sys/ioctl.h>
-#include <sys/stat.h>
 #include <sys/wait.h>
-#include <unistd.h>
 
 #include <string>
 
 #include <gtest/gtest.h>
 
-#include "EngineTestSupport.h"
 #include "FileSystemUtils.h"
+#include "TestKit.h"
 
-using namespace hf_test;
+using testkit::Exists;
 
 namespace
 {
-bool Exists(const std::string& path)
-{
-    struct stat info;
-    return lstat(path.c_str(), &info) == 0;
-}
-
 mode_t Mode(const std::string& path)
 {
     struct stat info;
     return lstat(path.c_str(), &info) == 0 ? info.st_mode & 07777 : 0;
 }
 
-// Sets or clears the immutable flag; false where the file system or the
-// process's privileges do not allow it.
-bool SetImmutable(const std::string& path, bool on)
+// Sets or clears the immutable flag and tells whether it is set now; false
+// where the file system or the process's privileges do not allow it.
+bool Immutable(const std::string& path, int change)
 {
     const int fd = open(path.c_str(), O_RDONLY | O_NONBLOCK);
-    if (fd < 0)
-        return false;
     int flags = 0;
-    bool ok = ioctl(fd, FS_IOC_GETFLAGS, &flags) == 0;
-    if (ok)
+    bool ok = fd >= 0 && ioctl(fd, FS_IOC_GETFLAGS, &flags) == 0;
+    if (ok && change != 0)
     {
-        flags = on ? (flags | FS_IMMUTABLE_FL) : (flags & ~FS_IMMUTABLE_FL);
+        flags = change > 0 ? (flags | FS_IMMUTABLE_FL) : (flags & ~FS_IMMUTABLE_FL);
         ok = ioctl(fd, FS_IOC_SETFLAGS, &flags) == 0;
     }
-    close(fd);
-    return ok;
-}
-
-bool IsImmutable(const std::string& path)
-{
-    const int fd = open(path.c_str(), O_RDONLY | O_NONBLOCK);
-    int flags = 0;
-    const bool got = fd >= 0 && ioctl(fd, FS_IOC_GETFLAGS, &flags) == 0;
     if (fd >= 0)
         close(fd);
-    return got && (flags & FS_IMMUTABLE_FL);
+    return ok && (flags & FS_IMMUTABLE_FL);
 }
 
-// A small tree: a read-only file, a read-only folder holding a file, a
-// hidden file and a folder nobody may enter.
+// A read-only file, a read-only folder holding a file, a hidden file and a
+// folder nobody may enter.
 void BuildTree(const std::string& root)
 {
     ASSERT_EQ(mkdir(root.c_str(), 0755), 0);
-    WriteBytes(root + "/readonly.txt", "r");
+    for (const char* folder : {"/locked", "/closed"})
+        ASSERT_EQ(mkdir((root + folder).c_str(), 0755), 0);
+    for (const char* file : {"/readonly.txt", "/locked/inner.txt", "/.hidden", "/closed/deep.txt"})
+        testkit::WriteFile(root + file, "x");
     chmod((root + "/readonly.txt").c_str(), 0444);
-    ASSERT_EQ(mkdir((root + "/locked").c_str(), 0755), 0);
-    WriteBytes(root + "/locked/inner.txt", "i");
     chmod((root + "/locked").c_str(), 0555);
-    WriteBytes(root + "/.hidden", "h");
-    ASSERT_EQ(mkdir((root + "/closed").c_str(), 0755), 0);
-    WriteBytes(root + "/closed/deep.txt", "d");
     chmod((root + "/closed").c_str(), 0);
 }
 } // namespace
 
-TEST(FileSystemUtils, MissingPathIsNotMadeWritable)
+TEST(FileSystemUtils, EveryEntryBecomesWritableThenTheTreeGoes)
 {
-    ScratchDir scratch;
+    testkit::ScratchDir scratch("hf-fsutils");
     EXPECT_FALSE(MakeFolderWritable(scratch.File("missing").c_str()));
     EXPECT_FALSE(MakeFolderWritable(""));
-}
 
-TEST(FileSystemUtils, EveryEntryBecomesWritable)
-{
-    ScratchDir scratch;
     const std::string root = scratch.File("job");
     BuildTree(root);
     EXPECT_TRUE(MakeFolderWritable(root.c_str()));
     for (const char* entry : {"", "/readonly.txt", "/locked", "/locked/inner.txt", "/.hidden",
                               "/closed", "/closed/deep.txt"})
         EXPECT_EQ(Mode(root + entry), 0777u) << entry;
+
+    BuildTree(scratch.File("job2"));
+    DeleteFolderChildren(scratch.File("job2").c_str());
+    EXPECT_FALSE(Exists(scratch.File("job2")));
 }
 
-TEST(FileSystemUtils, DeleteRemovesTheTreeAndTheFolderItself)
+TEST(FileSystemUtils, ImmutableFlagIsClearedAndTheFileRemoved)
 {
-    ScratchDir scratch;
-    const std::string root = scratch.File("job");
-    BuildTree(root);
-    const bool immutable = [&]
-    {
-        WriteBytes(root + "/frozen.txt", "f");
-        return SetImmutable(root + "/frozen.txt", true);
-    }();
-    DeleteFolderChildren(root.c_str());
-    EXPECT_FALSE(Exists(root));
-    if (!immutable)
-        GTEST_SKIP() << "cannot set the immutable flag here; read-only entries were removed";
-}
-
-TEST(FileSystemUtils, ImmutableFlagIsCleared)
-{
-    ScratchDir scratch;
-    const std::string root = scratch.File("job");
-    ASSERT_EQ(mkdir(root.c_str(), 0755), 0);
-    WriteBytes(root + "/frozen.txt", "f");
-    if (!SetImmutable(root + "/frozen.txt", true))
+    testkit::ScratchDir scratch("hf-fsutils");
+    const std::string root = scratch.Sub("job"), frozen = root + "/frozen.txt";
+    testkit::WriteFile(frozen, "f");
+    if (!Immutable(frozen, +1))
         GTEST_SKIP() << "cannot set the immutable flag here (needs CAP_LINUX_IMMUTABLE and ext4)";
     EXPECT_TRUE(MakeFolderWritable(root.c_str()));
-    EXPECT_FALSE(IsImmutable(root + "/frozen.txt"));
-    SetImmutable(root + "/frozen.txt", false); // lets the scratch folder go
-}
-
-TEST(FileSystemUtils, LinksAreRemovedButNeverFollowed)
-{
-    ScratchDir scratch;
-    const std::string outside = scratch.File("outside.txt");
-    WriteBytes(outside, "keep me");
-    chmod(outside.c_str(), 0400);
-    const std::string outsideDir = scratch.File("outside-dir");
-    ASSERT_EQ(mkdir(outsideDir.c_str(), 0700), 0);
-    WriteBytes(outsideDir + "/keep.txt", "keep");
-
-    const std::string root = scratch.File("job");
-    ASSERT_EQ(mkdir(root.c_str(), 0755), 0);
-    ASSERT_EQ(symlink(outside.c_str(), (root + "/file-link").c_str()), 0);
-    ASSERT_EQ(symlink(outsideDir.c_str(), (root + "/dir-link").c_str()), 0);
-
-    EXPECT_TRUE(MakeFolderWritable(root.c_str()));
-    EXPECT_EQ(Mode(outside), 0400u);
-    EXPECT_EQ(Mode(outsideDir), 0700u);
-
+    EXPECT_FALSE(Immutable(frozen, 0));
+    Immutable(frozen, +1);
     DeleteFolderChildren(root.c_str());
     EXPECT_FALSE(Exists(root));
-    EXPECT_EQ(testkit::ReadFile(outside), "keep me");
-    EXPECT_EQ(testkit::ReadFile(outsideDir + "/keep.txt"), "keep");
+    Immutable(frozen, -1); // lets the scratch folder go if the test failed
 }
 
-TEST(FileSystemUtils, ShellCharactersInNamesAreJustCharacters)
+TEST(FileSystemUtils, LinksAreRemovedButNeverFollowedAndNamesNeverRun)
 {
-    ScratchDir scratch;
+    testkit::ScratchDir scratch("hf-fsutils");
+    const std::string outside = scratch.File("outside.txt"),
+                      outsideDir = scratch.Sub("outside-dir");
+    testkit::WriteFile(outside, "keep me");
+    testkit::WriteFile(outsideDir + "/keep.txt", "keep");
+    chmod(outside.c_str(), 0400);
+    chmod(outsideDir.c_str(), 0700);
     char previous[4096];
     ASSERT_NE(getcwd(previous, sizeof previous), nullptr);
     // Any command smuggled in through a name would create a file here.
@@ -158,16 +104,21 @@ TEST(FileSystemUtils, ShellCharactersInNamesAreJustCharacters)
                              "back `touch pwned2` quote", "semi; touch pwned3", "$HOME"})
     {
         SCOPED_TRACE(name);
-        const std::string root = scratch.File(name);
-        ASSERT_EQ(mkdir(root.c_str(), 0755), 0);
-        WriteBytes(root + "/inner; touch pwned4", "x");
-        chmod((root + "/inner; touch pwned4").c_str(), 0444);
+        const std::string root = scratch.Sub(name), inner = root + "/inner; touch pwned4";
+        testkit::WriteFile(inner, "x");
+        chmod(inner.c_str(), 0444);
+        ASSERT_EQ(symlink(outside.c_str(), (root + "/file-link").c_str()), 0);
+        ASSERT_EQ(symlink(outsideDir.c_str(), (root + "/dir-link").c_str()), 0);
         EXPECT_TRUE(MakeFolderWritable(root.c_str()));
-        EXPECT_EQ(Mode(root + "/inner; touch pwned4"), 0777u);
+        EXPECT_EQ(Mode(inner), 0777u);
+        EXPECT_EQ(Mode(outside), 0400u);
+        EXPECT_EQ(Mode(outsideDir), 0700u);
         DeleteFolderChildren(root.c_str());
         EXPECT_FALSE(Exists(root));
     }
     ASSERT_EQ(chdir(previous), 0);
+    EXPECT_EQ(testkit::ReadFile(outside), "keep me");
+    EXPECT_EQ(testkit::ReadFile(outsideDir + "/keep.txt"), "keep");
     for (const char* made : {"pwned1", "pwned2", "pwned3", "pwned4"})
         EXPECT_FALSE(Exists(scratch.File(made))) << made;
 }
@@ -176,10 +127,9 @@ TEST(FileSystemUtils, FailsWhereThePermissionIsNotOurs)
 {
     if (geteuid() != 0)
         GTEST_SKIP() << "needs root to test as another user";
-    ScratchDir scratch;
-    const std::string root = scratch.File("job");
-    ASSERT_EQ(mkdir(root.c_str(), 0755), 0);
-    WriteBytes(root + "/file.txt", "x");
+    testkit::ScratchDir scratch("hf-fsutils");
+    const std::string root = scratch.Sub("job");
+    testkit::WriteFile(root + "/file.txt", "x");
     chmod((root + "/file.txt").c_str(), 0444);
     ASSERT_EQ(chmod(scratch.Path().c_str(), 0755), 0);
     const pid_t child = fork();

@@ -33,20 +33,16 @@ std::vector<std::string> InstalledArtwork()
     return found;
 }
 
-EPStoPSparams_t A4Centred()
+// Original size, and A4 with the picture fitted into an area 18 points in
+// from the edges and centred.
+struct Records
 {
-    EPStoPSparams_t p = NoParams();
-    p.pageWidth = 595;
-    p.pageHeight = 842;
-    p.imageableLLX = p.imageableLLY = 18;
-    p.imageableURX = 577;
-    p.imageableURY = 824;
-    p.imagePosition = IMG_POS_CENTER;
-    p.customSize = p.autoScale = p.fitToPage = true;
-    static char setPageDevice[] = "<< /PageSize [595 842] >> setpagedevice";
-    p.setPageDeviceString = setPageDevice;
-    return p;
-}
+    std::string spd, none;
+    const EPStoPSparams_t a4 = Params("page 595 842; area 18 18 577 824; pos 4; auto; fit; "
+                                      "spd << /PageSize [595 842] >> setpagedevice",
+                                      spd);
+    const EPStoPSparams_t original = Params("", none);
+};
 
 std::string BaseName(const std::string& path)
 {
@@ -61,16 +57,17 @@ TEST(RealArtwork, ConvertsAndRendersWithoutError)
     const std::vector<std::string> artwork = InstalledArtwork();
     if (artwork.empty())
         GTEST_SKIP() << "no EPS artwork installed (ghostscript examples or Tk images)";
-    ScratchDir scratch;
+    testkit::ScratchDir scratch("hf-artwork");
+    const Records records;
     for (const std::string& eps : artwork)
     {
         SCOPED_TRACE(eps);
-        const Fingerprint before = TakeFingerprint(eps);
+        const std::string before = Fingerprint(eps);
         const std::string original = scratch.File(BaseName(eps) + ".orig.ps");
         const std::string onA4 = scratch.File(BaseName(eps) + ".a4.ps");
-        ASSERT_EQ(DetectAndConvert(eps, NoParams(), original), 1);
-        ASSERT_EQ(DetectAndConvert(eps, A4Centred(), onA4), 1);
-        EXPECT_TRUE(TakeFingerprint(eps) == before);
+        ASSERT_EQ(DetectAndConvert(eps, records.original, original), 1);
+        ASSERT_EQ(DetectAndConvert(eps, records.a4, onA4), 1);
+        EXPECT_TRUE(Fingerprint(eps) == before);
 
         // Original size: the page is the picture, the marks lie on it.
         const GhostscriptReport own = RunGhostscriptBBox(original);
@@ -100,13 +97,14 @@ TEST(RealArtwork, DosBinaryFromEpstoolGivesThePostScriptSectionOnly)
     const std::vector<std::string> artwork = InstalledArtwork();
     if (artwork.empty())
         GTEST_SKIP() << "no EPS artwork installed (ghostscript examples or Tk images)";
-    ScratchDir scratch;
+    testkit::ScratchDir scratch("hf-artwork");
+    const Records records;
     for (const std::string& eps : artwork)
     {
         SCOPED_TRACE(eps);
         const std::string wrapped = scratch.File(BaseName(eps) + ".dos.eps");
-        const testkit::ProcessResult made =
-            testkit::RunProgram({"epstool", "--add-tiff-preview", "--device", "tiffg3", eps, wrapped});
+        const testkit::ProcessResult made = testkit::RunProgram(
+            {"epstool", "--add-tiff-preview", "--device", "tiffg3", eps, wrapped});
         ASSERT_EQ(made.exitCode, 0) << made.err;
         const std::string dosBytes = testkit::ReadFile(wrapped);
         ASSERT_GE(dosBytes.size(), 30u);
@@ -118,8 +116,7 @@ TEST(RealArtwork, DosBinaryFromEpstoolGivesThePostScriptSectionOnly)
         const std::string section =
             dosBytes.substr(static_cast<size_t>(info.psOffset), static_cast<size_t>(info.psLength));
         const std::string fromDos = scratch.File("dos.ps");
-        const EPStoPSparams_t a4 = A4Centred();
-        ASSERT_EQ(ConvertEPStoPS(&context, &a4, fromDos.c_str()), 1);
+        ASSERT_EQ(ConvertEPStoPS(&context, &records.a4, fromDos.c_str()), 1);
 
         // Exactly the PostScript section between the wrapper's parts.
         const std::string out = testkit::ReadFile(fromDos);
@@ -134,9 +131,9 @@ TEST(RealArtwork, DosBinaryFromEpstoolGivesThePostScriptSectionOnly)
         // epstool rewrites the header comments (it rounds the high-resolution
         // box), so the same page comes from its section saved as a plain file.
         const std::string sectionFile = scratch.File("section.eps");
-        WriteBytes(sectionFile, section);
+        testkit::WriteFile(sectionFile, section);
         const std::string fromSection = scratch.File("section.ps");
-        ASSERT_EQ(DetectAndConvert(sectionFile, A4Centred(), fromSection), 1);
+        ASSERT_EQ(DetectAndConvert(sectionFile, records.a4, fromSection), 1);
         const std::string sectionRaster = RenderToPgm(fromSection, 36);
         ASSERT_FALSE(sectionRaster.empty());
         EXPECT_TRUE(sectionRaster == RenderToPgm(fromDos, 36))
@@ -144,7 +141,7 @@ TEST(RealArtwork, DosBinaryFromEpstoolGivesThePostScriptSectionOnly)
 
         // And the marks match those of the original plain file.
         const std::string fromPlain = scratch.File("plain.ps");
-        ASSERT_EQ(DetectAndConvert(eps, A4Centred(), fromPlain), 1);
+        ASSERT_EQ(DetectAndConvert(eps, records.a4, fromPlain), 1);
         const GhostscriptReport plain = RunGhostscriptBBox(fromPlain);
         const GhostscriptReport dos = RunGhostscriptBBox(fromDos);
         EXPECT_FALSE(dos.postscriptError) << dos.process.err;

@@ -1,33 +1,20 @@
 // The filter's settings in the host's preference XML, and what the server
 // description switches on.
 #include <gtest/gtest.h>
-#include <wx/sstream.h>
 #include <wx/xml/xml.h>
 
 #include "EPS.h"
+#include "HostModule.h"
+#include "TestKit.h"
 
-namespace
-{
-wxXmlNode* Element(wxXmlNode* parent, const wxString& name, const wxString& text = wxString())
-{
-    auto* node = new wxXmlNode(wxXML_ELEMENT_NODE, name);
-    if (!text.empty())
-        node->AddChild(new wxXmlNode(wxXML_TEXT_NODE, "text", text));
-    if (parent)
-        parent->AddChild(node);
-    return node;
-}
-} // namespace
-
-TEST(Preferences, SaveThenLoadRestoresEverySetting)
+TEST(Preferences, SaveThenLoadRestoresEverySettingAndTheFirstSaveWins)
 {
     EPS source("a");
     source.GetSettings()["PAGESIZE_COMMAND"] = "\n595 842 0 0 1 setpagesize";
     source.GetSettings()["IMAGEPOSITION"] = "Top Left";
-    source.GetSettings()["FORCEPAGESIZEX"] = "595.500000";
+    source.GetSettings()["DEFAULTPAGESIZE"] = "A4";
     wxXmlNode host(wxXML_ELEMENT_NODE, "Filter");
     EXPECT_EQ(source.SavePreference(&host), 0);
-
     wxXmlNode* ui = host.GetChildren();
     ASSERT_NE(ui, nullptr);
     EXPECT_EQ(ui->GetName(), "UI");
@@ -39,44 +26,39 @@ TEST(Preferences, SaveThenLoadRestoresEverySetting)
         EXPECT_EQ(e->GetChildren()->GetContent(), source.GetSettings()[e->GetName()]);
     }
     EXPECT_EQ(elements, source.GetSettings().size());
+    // Saving again appends a second UI element; loading reads the first.
+    source.GetSettings()["DEFAULTPAGESIZE"] = "Letter";
+    source.SavePreference(&host);
+    ASSERT_NE(ui->GetNext(), nullptr);
+    EXPECT_EQ(ui->GetNext()->GetName(), "UI");
 
     EPS target("b");
     EXPECT_EQ(target.LoadPreference(&host), 0);
-    for (const auto& entry : source.GetSettings())
-        EXPECT_EQ(target.GetSettings()[entry.first], entry.second) << entry.first;
+    EXPECT_EQ(target.GetSettings()["DEFAULTPAGESIZE"], "A4");
+    for (const char* key : {"PAGESIZE_COMMAND", "IMAGEPOSITION", "OUTPUTFILETYPEEPS"})
+        EXPECT_EQ(target.GetSettings()[key], source.GetSettings()[key]) << key;
     // Loading alone leaves the parameters as constructed.
     EXPECT_EQ(target.GetParams().imagePosition, 4u);
     EXPECT_EQ(target.GetParams().setPageDeviceString, nullptr);
     EXPECT_FALSE(target.IsOutputTypeOne());
 }
 
-TEST(Preferences, SavingTwiceAppendsAndLoadingUsesTheFirst)
-{
-    EPS eps("a");
-    wxXmlNode host(wxXML_ELEMENT_NODE, "Filter");
-    eps.GetSettings()["DEFAULTPAGESIZE"] = "A4";
-    eps.SavePreference(&host);
-    eps.GetSettings()["DEFAULTPAGESIZE"] = "Letter";
-    eps.SavePreference(&host);
-    ASSERT_NE(host.GetChildren()->GetNext(), nullptr);
-    EXPECT_EQ(host.GetChildren()->GetNext()->GetName(), "UI");
-
-    EPS reader("b");
-    reader.LoadPreference(&host);
-    EXPECT_EQ(reader.GetSettings()["DEFAULTPAGESIZE"], "A4");
-}
-
 TEST(Preferences, InitialisationReadsTheUIElementAtAnyDepth)
 {
+    // wxXmlNode's parent constructor puts a node first: AddChild appends.
     wxXmlNode root(wxXML_ELEMENT_NODE, "FilterSetting");
-    wxXmlNode* filter = Element(&root, "Filter");
-    wxXmlNode* ui = Element(filter, "UI");
-    Element(ui, "OUTPUTFILETYPEEPS", "0");
-    Element(ui, "IMAGEPOSITION", "Bottom Left");
-    Element(ui, "FORCEPAGESIZEX", "612");
-    wxXmlNode* twice = Element(ui, "DEFAULTPAGESIZE", "A4");
-    twice->AddChild(new wxXmlNode(wxXML_TEXT_NODE, "text", "Letter")); // the last one wins
-    Element(ui, "AUTOROTATE"); // no content: the setting keeps its value
+    auto* filter = new wxXmlNode(wxXML_ELEMENT_NODE, "Filter");
+    auto* ui = new wxXmlNode(wxXML_ELEMENT_NODE, "UI");
+    root.AddChild(filter);
+    filter->AddChild(ui);
+    hf_test::AddSetting(ui, "OUTPUTFILETYPEEPS", "0");
+    hf_test::AddSetting(ui, "IMAGEPOSITION", "Bottom Left");
+    hf_test::AddSetting(ui, "FORCEPAGESIZEX", "612");
+    auto* twice = new wxXmlNode(wxXML_ELEMENT_NODE, "DEFAULTPAGESIZE");
+    ui->AddChild(twice);
+    for (const char* text : {"A4", "Letter"}) // the last text wins
+        twice->AddChild(new wxXmlNode(wxXML_TEXT_NODE, "text", text));
+    ui->AddChild(new wxXmlNode(wxXML_ELEMENT_NODE, "AUTOROTATE")); // no text: the value stays
 
     EPS eps("x");
     eps.GetSettings()["AUTOROTATE"] = "1";
@@ -89,29 +71,20 @@ TEST(Preferences, InitialisationReadsTheUIElementAtAnyDepth)
     EXPECT_EQ(eps.GetParams().imagePosition, 0u);
     EXPECT_EQ(eps.GetParams().pageWidth, 612);
     EXPECT_TRUE(eps.GetParams().autoRotate);
-}
 
-TEST(Preferences, WithoutUIStillRebuildsFromConstructorSettings)
-{
-    EPS eps("x");
+    // Without a UI element the parameters are still rebuilt.
+    EPS bare("y");
     wxXmlNode empty(wxXML_ELEMENT_NODE, "Filter");
-    EXPECT_EQ(eps.InitilaizeFromPreference(&empty), 0);
-    EXPECT_TRUE(eps.IsOutputTypeOne());
-    EXPECT_EQ(eps.GetParams().pageWidth, 0); // the page follows the (absent) settings
-    EXPECT_NE(eps.GetParams().setPageDeviceString, nullptr);
+    EXPECT_EQ(bare.InitilaizeFromPreference(&empty), 0);
+    EXPECT_TRUE(bare.IsOutputTypeOne());
+    EXPECT_EQ(bare.GetParams().pageWidth, 0);
+    EXPECT_NE(bare.GetParams().setPageDeviceString, nullptr);
 }
 
 TEST(Initialization, ServerFlagsAndPaperLists)
 {
-    const wxString server =
-        "<Server><Features><GA2_HOTFOLDERS>no</GA2_HOTFOLDERS><HF_EPS_FILTER>On</HF_EPS_FILTER>"
-        "<SubstrateFamilySupported>2</SubstrateFamilySupported></Features>"
-        "<SheetInfo><PaperName>A4</PaperName><Width>595</Width><Height>842</Height>"
-        "<PSCommand>a4</PSCommand><PaperName>Letter</PaperName><Width>612</Width>"
-        "<Height>792</Height><PSCommand>letter</PSCommand></SheetInfo>"
-        "<DefaultPPDPageSize><PaperName>A4</PaperName><Width>595</Width></DefaultPPDPageSize>"
-        "<CustomPageSizeInfo><MaxMediaWidth>3456</MaxMediaWidth><LeftHWMargin>12</LeftHWMargin>"
-        "</CustomPageSizeInfo></Server>";
+    // The hot-folder feature is off, the filter's own feature on.
+    const wxString server = testkit::ReadFile(HF_TEST_DATA_DIR "/filter/server-features.xml");
     EPS eps("x");
     EXPECT_EQ(eps.Initialize(server), 0);
     EXPECT_TRUE(eps.IsFilterEnabled());
@@ -124,24 +97,17 @@ TEST(Initialization, ServerFlagsAndPaperLists)
     EXPECT_EQ(eps.GetCustomPageSizeInfo().LeftHWMargin, 12);
     EXPECT_EQ(eps.GetServerDescription(), server);
 
-    // An empty text keeps the description and changes nothing learned.
+    // An empty text keeps the description and changes nothing learned; a
+    // second description appends its sheets.
     EXPECT_EQ(eps.Initialize(""), 0);
     EXPECT_EQ(eps.GetServerDescription(), server);
     EXPECT_TRUE(eps.IsFilterEnabled());
     EXPECT_EQ(eps.GetSheetList().size(), 2u);
-    // A second description appends its sheets.
     eps.Initialize(server);
     EXPECT_EQ(eps.GetSheetList().size(), 4u);
-}
 
-TEST(Initialization, StrictFlagForTheHotFolderFeature)
-{
-    EPS loose("x"), strict("y"), none("z");
+    // The hot-folder feature takes only its strict words ("True" is none).
+    EPS loose("y");
     loose.Initialize("<S><GA2_HOTFOLDERS>True</GA2_HOTFOLDERS></S>");
-    EXPECT_FALSE(loose.IsFilterEnabled()); // "True" is not one of the strict words
-    strict.Initialize("<S><GA2_HOTFOLDERS>true</GA2_HOTFOLDERS></S>");
-    EXPECT_TRUE(strict.IsFilterEnabled());
-    none.Initialize("<not xml");
-    EXPECT_FALSE(none.IsFilterEnabled());
-    EXPECT_FALSE(none.IsSubstrateFamilySupported());
+    EXPECT_FALSE(loose.IsFilterEnabled());
 }

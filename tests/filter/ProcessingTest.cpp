@@ -1,188 +1,105 @@
-// Jobs through the converter: results, outputs, progress, job overrides.
-#include <clocale>
+// Jobs through the converter: results, outputs, progress and job overrides
+// over the table tests/data/filter/processing.txt.
+#include <unistd.h>
+
+#include <sstream>
 #include <string>
-#include <utility>
-#include <vector>
 
 #include <gtest/gtest.h>
-#include <wx/filename.h>
 
 #include "EPS.h"
 #include "HostModule.h"
 #include "SampleEps.h"
-
-using hf_test::FolderOverrides;
+#include "TestKit.h"
 
 namespace
 {
-struct Jobs : ::testing::Test
+std::vector<std::string> Items(const std::string& text, char separator)
 {
-    sample::ScratchDir in, out;
-    EPS eps{"x"};
-    hf_test::ProgressRecorder progress;
+    std::vector<std::string> items;
+    std::istringstream in(text);
+    for (std::string item; std::getline(in >> std::ws, item, separator);)
+        if (item != "-")
+            items.push_back(item);
+    return items;
+}
 
-    void SetUp() override
-    {
-        // Normal mode with A4 as the page.
-        eps.GetSettings()["OUTPUTFILETYPEEPS"] = "0";
-        eps.GetSettings()["DEFAULTPAGESIZE"] = "A4 ";
-        eps.GetSettings()["FORCEPAGESIZEX"] = "595";
-        eps.GetSettings()["FORCEPAGESIZEY"] = "842";
-        wxXmlNode none(wxXML_ELEMENT_NODE, "Filter");
-        eps.InitilaizeFromPreference(&none);
-        hf_test::WriteEmptyFolderConfig(out.File("Folder.cfg"), "folder");
-    }
-
-    db::JobConfiguration::Map Overrides() { return FolderOverrides(out.File("Folder.cfg")); }
-
-    ReadyToProcessJobInfo Job(std::initializer_list<wxString> files)
-    {
-        ReadyToProcessJobInfo job;
-        job.filterId = "Orv.EPS.1";
-        for (const wxString& f : files)
-            job.files.Add(f);
-        return job;
-    }
-
-    wxString Eps(const wxString& name)
-    {
-        const wxString path = in.File(name);
-        sample::WriteFile(path, sample::RectangleEps(0, 0, 200, 100));
-        return path;
-    }
-};
+// A filter in normal mode with A4 as the page, then the given settings.
+void SetUpFilter(EPS& eps, const std::vector<std::pair<std::string, std::string>>& settings)
+{
+    eps.GetSettings()["OUTPUTFILETYPEEPS"] = "0";
+    eps.GetSettings()["DEFAULTPAGESIZE"] = "A4 ";
+    eps.GetSettings()["FORCEPAGESIZEX"] = "595";
+    eps.GetSettings()["FORCEPAGESIZEY"] = "842";
+    for (const auto& [key, value] : settings)
+        eps.GetSettings()[key] = value;
+    wxXmlNode none(wxXML_ELEMENT_NODE, "Filter");
+    eps.InitilaizeFromPreference(&none);
+}
 } // namespace
 
-TEST_F(Jobs, ConvertsIntoTheOutputFolderAndWritesThePageSize)
+TEST(Processing, TableOfJobs)
 {
-    const wxString input = Eps("art.work.eps");
-    wxString name;
-    EXPECT_EQ(eps.Process("", Job({input}), out.Path(), name, &progress), 0);
-    EXPECT_EQ(name, "art.work.ps");
-    EXPECT_TRUE(wxFileName::FileExists(out.File("art.work.ps")));
-    ASSERT_EQ(progress.calls.size(), 2u);
-    EXPECT_EQ(progress.calls[0], std::make_pair(input, 10));
-    EXPECT_EQ(progress.calls[1], std::make_pair(input, 100));
+    const auto cases = testkit::ReadCaseTable("filter/processing.txt");
+    ASSERT_GT(cases.size(), 8u);
+    for (const auto& c : cases)
+    {
+        ASSERT_EQ(c.size(), 8u) << c[0];
+        SCOPED_TRACE(c[0]);
+        testkit::ScratchDir in("hf-jobs-in"), out("hf-jobs-out");
+        const std::string config = out.File("Folder.cfg");
+        hf_test::WriteEmptyFolderConfig(config, "folder");
+        EPS eps("x");
+        ReadyToProcessJobInfo job;
+        job.filterId = "Orv.EPS.1";
+        std::vector<std::pair<std::string, std::string>> settings;
+        for (const std::string& item : Items(c[1], ';'))
+        {
+            const size_t equals = item.find('=');
+            if (item == "pass-through") // the constructor's output type
+                settings.emplace_back("OUTPUTFILETYPEEPS", "1");
+            else if (item == "substrate")
+                eps.Initialize("<S><SubstrateFamilySupported>yes</SubstrateFamilySupported></S>");
+            else if (item == "no-config")
+                unlink(config.c_str());
+            else if (item == "no-filter-id")
+                job.filterId.clear();
+            else if (item.rfind("blocked ", 0) == 0)
+                out.Sub(item.substr(8));
+            else if (equals != std::string::npos)
+                settings.emplace_back(item.substr(0, equals), item.substr(equals + 1));
+        }
+        SetUpFilter(eps, settings);
+        for (const std::string& file : Items(c[2], ' '))
+        {
+            const std::string name = file.substr(0, file.find('='));
+            testkit::WriteFile(in.File(name), file.find("=text") == std::string::npos
+                                                  ? sample::RectangleEps(0, 0, 200, 100)
+                                                  : "plain text\n");
+            job.files.Add(in.File(name));
+        }
 
-    const auto overrides = Overrides();
-    ASSERT_EQ(overrides.size(), 1u);
-    EXPECT_EQ(overrides.at("PageSize").GetValue(), "A4"); // trailing blank trimmed
-}
-
-TEST_F(Jobs, CustomPageSizeOverridesKeepTheStoredTexts)
-{
-    eps.GetSettings()["CUSTOMPAGESIZE"] = "1";
-    eps.GetSettings()["FORCEPAGESIZEX"] = "612";
-    eps.GetSettings()["FORCEPAGESIZEY"] = "792.500000";
-    wxString name;
-    EXPECT_EQ(eps.Process("", Job({Eps("a.eps")}), out.Path(), name, nullptr), 0);
-    const auto overrides = Overrides();
-    ASSERT_EQ(overrides.size(), 2u);
-    EXPECT_EQ(overrides.at("PageSize").GetValue(), "Custom");
-    EXPECT_EQ(overrides.at("CustomPageSize").GetValue(), "612 792.500000");
-    EXPECT_EQ(overrides.at("CustomPageSize").GetDisplayValue(), "612 792.500000");
-}
-
-TEST_F(Jobs, OnlyTheLastFileDecides)
-{
-    const wxString first = Eps("first.eps"), second = Eps("second.eps");
-    // A directory where the first output should go makes its conversion fail.
-    out.Sub("first.ps");
-    wxString name;
-    EXPECT_EQ(eps.Process("", Job({first, second}), out.Path(), name, &progress), 0);
-    EXPECT_EQ(name, "second.ps");
-    EXPECT_EQ(progress.calls.size(), 4u);
-    EXPECT_EQ(Overrides().count("PageSize"), 1u);
-
-    // The other way round the job fails and writes no overrides.
-    hf_test::WriteEmptyFolderConfig(out.File("Folder.cfg"), "folder");
-    out.Sub("second2.ps");
-    const wxString second2 = Eps("second2.eps");
-    EXPECT_EQ(eps.Process("", Job({first, second2}), out.Path(), name, nullptr), -1003);
-    EXPECT_EQ(eps.GetStatus(), -1003);
-    EXPECT_EQ(name, "second2.ps");
-    EXPECT_TRUE(Overrides().empty());
-}
-
-TEST_F(Jobs, NonEpsStopsAtOnceAfterTheFirstReport)
-{
-    const wxString good = Eps("good.eps");
-    const wxString bad = in.File("bad.eps");
-    sample::WriteFile(bad, "plain text\n");
-    const wxString after = Eps("after.eps");
-    wxString name;
-    EXPECT_EQ(eps.Process("", Job({good, bad, after}), out.Path(), name, &progress), -1005);
-    EXPECT_EQ(eps.GetStatus(), -1005);
-    EXPECT_TRUE(wxFileName::FileExists(out.File("good.ps")));
-    EXPECT_FALSE(wxFileName::FileExists(out.File("after.ps")));
-    ASSERT_EQ(progress.calls.size(), 3u);
-    EXPECT_EQ(progress.calls[2], std::make_pair(bad, 10));
-    EXPECT_TRUE(Overrides().empty());
-}
-
-TEST_F(Jobs, EmptyJobsAndMissingFilter)
-{
-    wxString name = "unchanged";
-    EXPECT_EQ(eps.Process("", Job({}), out.Path(), name, &progress), -1002);
-    ReadyToProcessJobInfo anonymous = Job({Eps("a.eps")});
-    anonymous.filterId.clear();
-    EXPECT_EQ(eps.Process("", anonymous, out.Path(), name, &progress), -1006);
-    EXPECT_EQ(eps.GetStatus(), -1006);
-    EXPECT_EQ(name, "unchanged");
-    EXPECT_TRUE(progress.calls.empty());
-}
-
-TEST_F(Jobs, PassThroughTouchesNothing)
-{
-    EPS passThrough("p");
-    wxXmlNode none(wxXML_ELEMENT_NODE, "Filter");
-    passThrough.InitilaizeFromPreference(&none); // the constructor's default is pass-through
-    ASSERT_TRUE(passThrough.IsOutputTypeOne());
-    const wxString a = Eps("a.eps");
-    const wxString b = in.File("b.EPS");
-    sample::WriteFile(b, "not even EPS");
-    wxString name;
-    EXPECT_EQ(passThrough.Process("", Job({a, b}), out.Path(), name, &progress), 0);
-    EXPECT_EQ(name, "b.EPS");
-    EXPECT_EQ(progress.calls.size(), 4u);
-    EXPECT_EQ(progress.calls[3], std::make_pair(b, 100));
-    EXPECT_FALSE(wxFileName::FileExists(out.File("a.ps")));
-    EXPECT_TRUE(Overrides().empty());
-}
-
-TEST_F(Jobs, SubstrateFamiliesMeanNoOverrides)
-{
-    eps.Initialize("<S><SubstrateFamilySupported>yes</SubstrateFamilySupported></S>");
-    wxString name;
-    EXPECT_EQ(eps.Process("", Job({Eps("a.eps")}), out.Path(), name, nullptr), 0);
-    EXPECT_TRUE(Overrides().empty());
-}
-
-TEST_F(Jobs, NoFolderConfigurationNoOverridesNoFailure)
-{
-    wxRemoveFile(out.File("Folder.cfg"));
-    wxString name;
-    EXPECT_EQ(eps.Process("", Job({Eps("a.eps")}), out.Path(), name, nullptr), 0);
-    EXPECT_FALSE(wxFileName::FileExists(out.File("Folder.cfg")));
-}
-
-TEST_F(Jobs, DecimalCommaLanguageStillWritesPoints)
-{
-    const std::string saved = std::setlocale(LC_ALL, nullptr);
-    if (!std::setlocale(LC_ALL, "de_DE.UTF-8"))
-        GTEST_SKIP() << "de_DE.UTF-8 is not generated";
-    // What a German application language leaves behind: a decimal-comma C
-    // locale. The stored settings keep their points.
-    eps.GetSettings()["IMAGEEABLESIZELLX"] = "12.5";
-    eps.GetSettings()["IMAGEEABLESIZELLY"] = "12.5";
-    eps.GetSettings()["IMAGEEABLESIZEURX"] = "582.5";
-    eps.GetSettings()["IMAGEEABLESIZEURY"] = "829.5";
-    eps.LoadEPSParams();
-    wxString name;
-    const long status = eps.Process("", Job({Eps("komma.eps")}), out.Path(), name, nullptr);
-    std::setlocale(LC_ALL, saved.c_str());
-    ASSERT_EQ(status, 0);
-    const std::string ps = sample::ReadFile(out.File("komma.ps"));
-    EXPECT_NE(ps.find("%%HiResBoundingBox: 12.5 12.5 582.5 829.5\r\n"), std::string::npos);
-    EXPECT_EQ(ps.find("12,5"), std::string::npos);
+        hf_test::ProgressRecorder progress;
+        wxString name = "(unchanged)";
+        const long result = eps.Process("", job, out.Path(), name, &progress);
+        EXPECT_EQ(std::to_string(result), c[3]);
+        EXPECT_EQ(result == 0 ? 0 : eps.GetStatus(), result);
+        EXPECT_EQ(name.ToStdString(), c[4]);
+        for (const std::string& output : Items(c[5], ' '))
+            EXPECT_EQ(testkit::Exists(out.File(output.substr(output[0] == '!'))), output[0] != '!')
+                << output;
+        std::string calls;
+        for (const auto& call : progress.calls)
+            calls += (calls.empty() ? "" : ", ") + call.first.AfterLast('/').ToStdString() + " " +
+                     std::to_string(call.second);
+        EXPECT_EQ(calls.empty() ? "-" : calls, c[6]);
+        std::string overrides;
+        for (const auto& entry : hf_test::FolderOverrides(config))
+        {
+            EXPECT_EQ(entry.second.GetValue(), entry.second.GetDisplayValue());
+            overrides += (overrides.empty() ? "" : "; ") + entry.first.ToStdString() + "=" +
+                         entry.second.GetValue().ToStdString();
+        }
+        EXPECT_EQ(overrides.empty() ? "-" : overrides, c[7]);
+    }
 }

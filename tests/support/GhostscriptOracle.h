@@ -2,15 +2,7 @@
 // Runs Ghostscript as a test oracle: where a PostScript file marks the page,
 // how large the page is, and whether the interpreter hit an error. Programs
 // are started with an argument vector, never through a shell.
-#include <fcntl.h>
-#include <spawn.h>
-#include <sys/stat.h>
-#include <sys/wait.h>
-#include <unistd.h>
-
 #include <cstdio>
-#include <cstdlib>
-#include <fstream>
 #include <sstream>
 #include <string>
 #include <vector>
@@ -47,8 +39,8 @@ inline const char* PageSizeProbe()
 inline GhostscriptReport RunGhostscriptBBox(const std::string& psFile)
 {
     GhostscriptReport report;
-    report.process = testkit::RunProgram({"gs", "-q", "-dNOPAUSE", "-dBATCH", "-dSAFER", "-sDEVICE=bbox",
-                                 "-c", PageSizeProbe(), "-f", psFile});
+    report.process = testkit::RunProgram({"gs", "-q", "-dNOPAUSE", "-dBATCH", "-dSAFER",
+                                          "-sDEVICE=bbox", "-c", PageSizeProbe(), "-f", psFile});
     const std::string& err = report.process.err;
     report.postscriptError = report.process.exitCode != 0 ||
                              err.find("Error:") != std::string::npos ||

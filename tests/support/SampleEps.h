@@ -1,11 +1,10 @@
 #pragma once
 // Small EPS files written on the fly for tests: a filled rectangle that
-// exactly covers its bounding box.
+// exactly covers its bounding box, and a DOS EPS binary around a program.
+// Scratch folders and file access come from the test kit (TestKit.h).
+#include <cstdint>
 #include <cstdio>
 #include <string>
-
-#include <wx/filefn.h>
-#include <wx/filename.h>
 
 namespace sample
 {
@@ -26,29 +25,6 @@ inline std::string RectangleEps(double llx, double lly, double urx, double ury)
     text += draw;
     text += "%%EOF\n";
     return text;
-}
-
-inline bool WriteFile(const wxString& path, const std::string& bytes)
-{
-    FILE* f = std::fopen(path.fn_str(), "wb");
-    if (!f)
-        return false;
-    const bool ok = std::fwrite(bytes.data(), 1, bytes.size(), f) == bytes.size();
-    return std::fclose(f) == 0 && ok;
-}
-
-inline std::string ReadFile(const wxString& path)
-{
-    std::string bytes;
-    FILE* f = std::fopen(path.fn_str(), "rb");
-    if (!f)
-        return bytes;
-    char buffer[65536];
-    size_t n;
-    while ((n = std::fread(buffer, 1, sizeof buffer, f)) > 0)
-        bytes.append(buffer, n);
-    std::fclose(f);
-    return bytes;
 }
 
 // A DOS EPS binary: 30-byte header, then the PostScript section, then a
@@ -72,28 +48,4 @@ inline std::string DosEpsBinary(const std::string& postscript, const std::string
     return out + postscript + preview;
 }
 
-// A scratch directory removed with its content at the end of a test.
-class ScratchDir
-{
-public:
-    ScratchDir()
-    {
-        char pattern[] = "/tmp/hf-test-XXXXXX";
-        m_path = wxString::FromUTF8(mkdtemp(pattern));
-    }
-    ~ScratchDir() { wxFileName::Rmdir(m_path, wxPATH_RMDIR_RECURSIVE); }
-    ScratchDir(const ScratchDir&) = delete;
-    ScratchDir& operator=(const ScratchDir&) = delete;
-    const wxString& Path() const { return m_path; }
-    wxString File(const wxString& relative) const { return m_path + "/" + relative; }
-    wxString Sub(const wxString& name) const
-    {
-        wxString path = File(name);
-        wxFileName::Mkdir(path, 0755, wxPATH_MKDIR_FULL);
-        return path;
-    }
-
-private:
-    wxString m_path;
-};
 } // namespace sample

@@ -9,6 +9,7 @@
 #include "GhostscriptOracle.h"
 #include "PanelTestFixture.h"
 #include "SampleEps.h"
+#include "TestKit.h"
 
 using namespace ui_test;
 
@@ -43,9 +44,9 @@ TEST_F(PanelConversion, SavedChoicesPlaceAndSizeTheArtwork)
     ASSERT_EQ(0, processing.Initialize(TestDataText("ui/server-ui.xml")));
     ASSERT_EQ(0, processing.InitilaizeFromPreference(&host));
 
-    const sample::ScratchDir folder;
+    const testkit::ScratchDir folder;
     const wxString input = folder.File("art.eps"), output = folder.File("art.ps");
-    ASSERT_TRUE(sample::WriteFile(input, sample::RectangleEps(0, 0, 100, 50)));
+    ASSERT_TRUE(testkit::WriteFile(input.ToStdString(), sample::RectangleEps(0, 0, 100, 50)));
     void* context = nullptr;
     ASSERT_EQ(1u, IsThisEPS(input.fn_str(), &context));
     ASSERT_EQ(1, ConvertEPStoPS(&context, &processing.GetParams(), output.fn_str()));
