@@ -1,22 +1,33 @@
 #pragma once
-// Points the machine-wide store at a scratch directory for one test.
+// Points the machine-wide store at a scratch folder for one test.
 #include <gtest/gtest.h>
 
 #include <sys/stat.h>
 
 #include <wx/utils.h>
 
-#include "../store/StoreTestSupport.h"
+#include "TestKit.h"
 
 namespace machinetest
 {
+inline wxString Wx(const std::string& path)
+{
+    return wxString::FromUTF8(path);
+}
+
+inline unsigned ModeOf(const std::string& path)
+{
+    struct stat info;
+    return ::stat(path.c_str(), &info) == 0 ? (info.st_mode & 07777) : 0xFFFFu;
+}
+
 class WarehouseTest : public ::testing::Test
 {
 protected:
     void SetUp() override
     {
         m_hadRoot = wxGetEnv("HOTFOLDER_WAREHOUSE_ROOT", &m_oldRoot);
-        wxSetEnv("HOTFOLDER_WAREHOUSE_ROOT", m_root.wx());
+        wxSetEnv("HOTFOLDER_WAREHOUSE_ROOT", Wx(m_root.Path()));
     }
     void TearDown() override
     {
@@ -25,16 +36,9 @@ protected:
         else
             wxUnsetEnv("HOTFOLDER_WAREHOUSE_ROOT");
     }
-    std::string Warehouse() const { return m_root / "HotFolders"; }
-    static unsigned ModeOf(const std::string& path)
-    {
-        struct stat info;
-        return ::stat(path.c_str(), &info) == 0 ? (info.st_mode & 07777) : 0xFFFFu;
-    }
+    std::string Warehouse() const { return m_root.File("HotFolders"); }
 
-    storetest::TempDir m_root;
-
-private:
+    testkit::ScratchDir m_root;
     bool m_hadRoot = false;
     wxString m_oldRoot;
 };

@@ -1,60 +1,34 @@
-#include <clocale>
-#include <cstdlib>
-#include <locale.h>
-#include <string>
-
+// The system's measurement system comes from the environment's locale
+// (LC_ALL here), whatever the process's C locale is: "0" metric, "1" US
+// customary. `locale -k LC_MEASUREMENT` (1 metric, 2 US) says the same.
 #include <gtest/gtest.h>
 
+#include "ClientEnvironment.h"
 #include "utils/HFHelper.h"
 
-namespace
+TEST(SystemMeasurementUnit, FromTheEnvironmentsLocale)
 {
-// The measurement system comes from the environment, so each case sets
-// LC_ALL and puts the previous value back.
-class MeasurementEnvironment : public ::testing::Test
-{
-protected:
-    void SetUp() override
+    SKIP_WITHOUT_LOCALE("de_DE.UTF-8");
+    SKIP_WITHOUT_LOCALE("en_US.UTF-8");
+    SKIP_WITHOUT_LOCALE("en_GB.UTF-8");
+    const char* saved = std::getenv("LC_ALL");
+    const std::string old = saved ? saved : "";
+    // A locale the machine does not have counts as C, which is metric.
+    const std::pair<const char*, const char*> cases[] = {{"de_DE.UTF-8", "0"},
+                                                         {"en_US.UTF-8", "1"},
+                                                         {"en_GB.UTF-8", "0"},
+                                                         {"C", "0"},
+                                                         {"xx_YY.UTF-8", "0"}};
+    for (const auto& [locale, unit] : cases)
     {
-        const char* saved = std::getenv("LC_ALL");
-        m_hadValue = saved != nullptr;
-        if (saved)
-            m_saved = saved;
+        setenv("LC_ALL", locale, 1);
+        EXPECT_EQ(unit, HFHelper::GetSystemMeasurementUnit()) << locale;
+        if (!testkit::ProgramAvailable("locale"))
+            continue;
+        EXPECT_NE(testkit::RunProgram({"locale", "-k", "LC_MEASUREMENT"})
+                      .out.find(std::string("measurement=") + (*unit == '0' ? "1" : "2")),
+                  std::string::npos)
+            << locale;
     }
-    void TearDown() override
-    {
-        if (m_hadValue)
-            setenv("LC_ALL", m_saved.c_str(), 1);
-        else
-            unsetenv("LC_ALL");
-    }
-
-    static bool Installed(const char* name)
-    {
-        const locale_t probe = newlocale(LC_ALL_MASK, name, static_cast<locale_t>(0));
-        if (probe == static_cast<locale_t>(0))
-            return false;
-        freelocale(probe);
-        return true;
-    }
-
-private:
-    bool m_hadValue = false;
-    std::string m_saved;
-};
-} // namespace
-
-TEST_F(MeasurementEnvironment, MetricLocaleGivesZeroUsGivesOne)
-{
-    setenv("LC_ALL", "de_DE.UTF-8", 1);
-    const wxString german = HFHelper::GetSystemMeasurementUnit();
-    setenv("LC_ALL", "en_US.UTF-8", 1);
-    const wxString us = HFHelper::GetSystemMeasurementUnit();
-    setenv("LC_ALL", "en_GB.UTF-8", 1);
-    const wxString british = HFHelper::GetSystemMeasurementUnit();
-    if (!Installed("de_DE.UTF-8") || !Installed("en_GB.UTF-8"))
-        GTEST_SKIP() << "de_DE/en_GB locales are not installed (scripts/setup.sh)";
-    EXPECT_EQ("0", german);
-    EXPECT_EQ("1", us);
-    EXPECT_EQ("0", british);
+    saved ? setenv("LC_ALL", old.c_str(), 1) : unsetenv("LC_ALL");
 }

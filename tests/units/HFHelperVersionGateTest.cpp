@@ -1,10 +1,10 @@
+// This client ships version 3.4, which keeps the default language.
 #include <gtest/gtest.h>
 #include <wx/intl.h>
 
 #include "ClientEnvironment.h"
 #include "utils/HFHelper.h"
 
-// This client ships version 3.4, which keeps the default language.
 namespace
 {
 [[maybe_unused]] ::testing::Environment* const g_environment =

@@ -8,32 +8,21 @@
 #include <wx/textctrl.h>
 
 #include "NumericValidator.h"
+#include "TestKit.h"
 
-TEST(NumericValidatorText, CommaSeparatorAcceptsOnlyDigitsAndComma)
+TEST(NumericValidatorText, CasesOfTheTable)
 {
-    wxString value;
-    const NumericValidator validator(&value, ",");
-    EXPECT_TRUE(validator.IsValid("8,5").empty());
-    EXPECT_TRUE(validator.IsValid("0123456789").empty());
-    for (const char* bad : {"8.5", "+8", "-8", "8e2", "8E2", "8a"})
-        EXPECT_FALSE(validator.IsValid(bad).empty()) << bad;
-}
-
-TEST(NumericValidatorText, PointSeparatorRefusesComma)
-{
-    wxString value;
-    const NumericValidator validator(&value, ".");
-    EXPECT_TRUE(validator.IsValid("8.5").empty());
-    for (const char* bad : {"8,5", "-1", "1e3"})
-        EXPECT_FALSE(validator.IsValid(bad).empty()) << bad;
-}
-
-TEST(NumericValidatorText, ExclusionOrderAndAnyOtherSeparator)
-{
+    const auto cases = testkit::ReadCaseTable("units/numeric-validator.txt");
+    ASSERT_FALSE(cases.empty());
+    for (const testkit::CaseFields& c : cases)
+    {
+        ASSERT_EQ(c.size(), 4u);
+        wxString value;
+        const NumericValidator validator(&value, c[0] == "\"\"" ? "" : c[0]);
+        EXPECT_EQ(validator.IsValid(c[1]).empty(), c[2] == "yes") << c[0] << " " << c[1];
+    }
     EXPECT_EQ("+-eE.", NumericValidator::ExcludedCharacters(","));
     EXPECT_EQ("+-eE,", NumericValidator::ExcludedCharacters("."));
-    // Anything but "." counts as a decimal comma language.
-    EXPECT_EQ("+-eE.", NumericValidator::ExcludedCharacters(""));
 }
 
 TEST(NumericValidatorText, CloneKeepsFilterAndBinding)
