@@ -14,6 +14,7 @@
 
 #include "FolderFixtures.h"
 #include "db/AtomicFile.h"
+#include "posix/Directories.h"
 #include "posix/UniqueFd.h"
 
 using namespace storetest;
@@ -192,4 +193,15 @@ TEST(AtomicWrite, TempFilesOfKilledWritersAreRemovedOnceStale)
     EXPECT_FALSE(testkit::Exists(dir.File(".Folder.cfg.0badf00d.tmp")));
     EXPECT_TRUE(testkit::Exists(dir.File(".Folder.cfg.12345678.tmp")));
     EXPECT_TRUE(testkit::Exists(dir.File(".Other.cfg.0badf00d.tmp")));
+}
+
+// A tree goes whole: files first, then the folders that held them.
+TEST(RemoveTree, RemovesNestedFoldersAndFiles)
+{
+    testkit::ScratchDir dir;
+    dir.Sub("tree/a/b");
+    testkit::WriteFile(dir.File("tree/a/b/file"), "x");
+    testkit::WriteFile(dir.File("tree/top"), "x");
+    EXPECT_EQ(posix::RemoveTree(dir.File("tree")), 0);
+    EXPECT_FALSE(testkit::Exists(dir.File("tree")));
 }
