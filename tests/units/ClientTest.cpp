@@ -10,7 +10,6 @@
 
 #include "ClientEnvironment.h"
 #include "db/PluginInitialize.h"
-#include "utils/CLocaleNumbers.h"
 #include "utils/Config.h"
 #include "utils/HFHelper.h"
 
@@ -20,12 +19,13 @@ void ExpectCasesOfTheValueTable(); // UnitsTest.cpp
 
 namespace
 {
-// Registered for this program by ClientEnvironmentResources.cpp.
+// This client ships version 3.3, the version that follows the workstation
+// language.
 const std::string kResources = HF_TEST_DATA_DIR "/server/Resources";
+[[maybe_unused]] ::testing::Environment* const g_environment =
+    ::testing::AddGlobalTestEnvironment(new ClientEnvironment("Resources"));
 
-class Client : public RestoresCLocale
-{
-};
+using Client = RestoresCLocale;
 
 std::string Evaluate(const std::string& op, std::string input)
 {
@@ -38,6 +38,19 @@ std::string Evaluate(const std::string& op, std::string input)
         return HFHelper::GetLocaleNameForLanguage(input).ToStdString();
     if (op == "system-locale")
         return HFHelper::GetSystemLocaleForName(input).ToStdString();
+    if (op == "measurement") // LC_ALL names the locale; the locale program must agree
+    {
+        const char* saved = std::getenv("LC_ALL");
+        const std::string old = saved ? saved : "";
+        setenv("LC_ALL", input.c_str(), 1);
+        const std::string unit = HFHelper::GetSystemMeasurementUnit().ToStdString();
+        const std::string program = testkit::RunProgram({"locale", "-k", "LC_MEASUREMENT"}).out;
+        saved ? setenv("LC_ALL", old.c_str(), 1) : unsetenv("LC_ALL");
+        return unit +
+               (program.find(unit == "0" ? "measurement=1" : "measurement=2") != std::string::npos
+                    ? ""
+                    : " (the locale program disagrees)");
+    }
     for (const auto& [escape, character] : {std::pair{"\\t", "\t"}, {"\\r", "\r"}, {"\\n", "\n"}})
         for (size_t at; (at = input.find(escape)) != std::string::npos;)
             input.replace(at, 2, character);
@@ -65,7 +78,9 @@ TEST_F(Client, CasesOfTheTable)
     for (const testkit::CaseFields& c : cases)
     {
         ASSERT_EQ(c.size(), 4u);
-        const std::string system = c[0] == "separator" ? c[2].substr(2, c[2].size() - 4) : "C";
+        const std::string system = c[0] == "separator" ? c[2].substr(2, 11)
+                                   : c[0] == "measurement" && c[1].rfind("xx", 0) ? c[1]
+                                                                                  : "C";
         if (!testkit::ScopedLocale(system.c_str()))
         {
             missing += " " + system;
@@ -97,7 +112,6 @@ TEST_F(Client, StoredValuesKeepPointWhileGermanIsSelected)
     ASSERT_EQ(",", HFHelper::GetDecimalSeparatorFromAppLang());
     EXPECT_EQ("8,50", wxString::Format("%.2f", 8.5)); // display text follows the language
     ExpectCasesOfTheValueTable();                     // stored and exchanged numbers do not
-    EXPECT_EQ(842.9, utils::StrToDoubleC("842.9"));
     std::vector<stPageAttribute> sheets;
     ASSERT_TRUE(PluginInitialize::InitializeSheetInfo(
         "<S><SheetInfo><Width>595.28</Width><PSCommand>x</PSCommand></SheetInfo></S>", sheets));

@@ -10,9 +10,7 @@ namespace
 [[maybe_unused]] ::testing::Environment* const g_environment =
     ::testing::AddGlobalTestEnvironment(new ClientEnvironment("Resources-3.4"));
 
-class OtherClientVersion : public RestoresCLocale
-{
-};
+using OtherClientVersion = RestoresCLocale;
 } // namespace
 
 TEST_F(OtherClientVersion, IgnoresTheWorkstationLanguage)

@@ -72,6 +72,14 @@ std::string Evaluate(const std::string& op, std::string input)
         ok = DecodeCustomPageUnit(input, unit);
         return (ok ? "yes " : "no ") + WordOf(unit);
     }
+    if (op == "read-flag") // the stored text ("(absent)": no entry) and the default
+    {
+        MapPropToValue settings(10);
+        if (a != "(absent)")
+            settings["K"] = a == "(empty)" ? "" : a;
+        ok = ReadSettingFlag(settings, "K", b == "1");
+        return (ok ? "yes" : "no") + std::string(settings.count("K") ? " listed" : "");
+    }
     if (op == "default-dimension")
         return DefaultOriginalDimension(input == "inch").ToStdString();
     return Result(ok, value);
@@ -94,17 +102,4 @@ void ExpectCasesOfTheValueTable()
 TEST(UnitsAndSettingValues, CasesOfTheTable)
 {
     ExpectCasesOfTheValueTable();
-}
-
-TEST(SettingsFlags, EmptyValueTakesDefaultAndReadingInsertsKey)
-{
-    MapPropToValue settings(100);
-    EXPECT_TRUE(
-        ReadSettingFlag(settings, SettingsKeys::ORIGINALSIZE, SettingsDefaults::ORIGINALSIZE));
-    ASSERT_EQ(1u, settings.count(SettingsKeys::ORIGINALSIZE));
-    EXPECT_TRUE(settings[SettingsKeys::ORIGINALSIZE].empty());
-    settings[SettingsKeys::ORIGINALSIZE] = "0";
-    EXPECT_FALSE(ReadSettingFlag(settings, SettingsKeys::ORIGINALSIZE, true));
-    settings[SettingsKeys::FITTOPAGE] = "yes";
-    EXPECT_FALSE(ReadSettingFlag(settings, SettingsKeys::FITTOPAGE, SettingsDefaults::FITTOPAGE));
 }
