@@ -1,15 +1,22 @@
 #pragma once
 // A folder configuration with every field set to a distinct, non-default
-// value, so a field lost or swapped anywhere shows up in a comparison.
+// value, so a field lost or swapped anywhere shows up. Configurations are
+// compared by the bytes the writer makes of them.
 #include <gtest/gtest.h>
 
 #include <wx/sstream.h>
 
+#include "TestKit.h"
 #include "db/ConfigurationReader.h"
 #include "db/HFDatabase.h"
 
 namespace storetest
 {
+inline wxString Wx(const std::string& path)
+{
+    return wxString::FromUTF8(path);
+}
+
 struct FolderConfig
 {
     db::Setting setting;
@@ -19,11 +26,31 @@ struct FolderConfig
     db::ImposeConfiguration impose;
     db::PreflightConfiguration preflight;
 
-    int Write(const wxString& path) const
+    int Write(const std::string& path) const
     {
         wxString saved;
-        return db::HFDatabase::WriteFolderProperties(path, setting, job, folders, filter, impose,
-                                                     preflight, saved);
+        const int result = db::HFDatabase::WriteFolderProperties(Wx(path), setting, job, folders,
+                                                                 filter, impose, preflight, saved);
+        EXPECT_EQ(saved, result == 0 ? Wx(path) : saved);
+        return result;
+    }
+    // The whole file this configuration makes.
+    std::string Bytes() const
+    {
+        testkit::ScratchDir dir("hf-store");
+        Write(dir.File("Folder.cfg"));
+        return testkit::ReadFile(dir.File("Folder.cfg"));
+    }
+    // Every reader on path; the result is ReadSetting's.
+    int ReadAll(const std::string& path)
+    {
+        const int result = db::HFDatabase::ReadSetting(Wx(path), setting);
+        EXPECT_EQ(db::ConfigurationReader::ReadFolderConfiguration(Wx(path), folders), 0);
+        EXPECT_EQ(db::ConfigurationReader::ReadJobConfiguration(Wx(path), job), 0);
+        EXPECT_EQ(db::ConfigurationReader::ReadFilterConfiguration(Wx(path), filter), 0);
+        EXPECT_EQ(db::ConfigurationReader::ReadImposeConfiguration(Wx(path), impose), 0);
+        EXPECT_EQ(db::ConfigurationReader::ReadPreflightConfiguration(Wx(path), preflight), 0);
+        return result;
     }
 };
 
@@ -64,12 +91,10 @@ inline FolderConfig FullFolderConfig()
     s.SetCustomInterval(true);
     s.SetCustomTimeInterval("45");
     s.SetInputFormats({{"EPS", "Encapsulated PostScript"}, {"PDF", "Portable Document"}});
-
     c.folders.SetFailFolder("/hf/fail");
     c.folders.SetWorkFolder("/hf/work");
     c.folders.SetBackupFolder("/hf/keep");
     c.folders.SetHotFolder("/hf");
-
     c.job.SaveProperty("PageSize", "A4", "A4 display", "A4 lokal");
     c.job.SaveProperty("Copies", "2", "Two", "Zwei");
     c.impose.SaveProperty("Layout", "2up", "Two up");
@@ -82,68 +107,26 @@ inline FolderConfig FullFolderConfig()
     return c;
 }
 
-inline void ExpectSameSetting(const db::Setting& a, const db::Setting& b)
+// The full configuration, changed as the tables of tests/data/store name it.
+inline FolderConfig Variant(const std::string& name)
 {
-    EXPECT_EQ(a.GetName(), b.GetName());
-    EXPECT_EQ(a.GetDescription(), b.GetDescription());
-    EXPECT_EQ(a.GetServerIP(), b.GetServerIP());
-    EXPECT_EQ(a.GetServerName(), b.GetServerName());
-    EXPECT_EQ(a.GetServerVersion(), b.GetServerVersion());
-    EXPECT_EQ(a.GetTextServerVersion(), b.GetTextServerVersion());
-    EXPECT_EQ(a.GetServerType(), b.GetServerType());
-    EXPECT_EQ(a.GetBaseVirtualPrinter(), b.GetBaseVirtualPrinter());
-    EXPECT_EQ(a.GetBaseVirtualPrinterName(), b.GetBaseVirtualPrinterName());
-    EXPECT_EQ(a.GetBaseVirtualPrinterDisplayName(), b.GetBaseVirtualPrinterDisplayName());
-    EXPECT_EQ(a.GetSelectedPreset(), b.GetSelectedPreset());
-    EXPECT_EQ(a.GetPPDVersion(), b.GetPPDVersion());
-    EXPECT_EQ(a.GetServerTypeAndJPDefaultKeyInfo(), b.GetServerTypeAndJPDefaultKeyInfo());
-    EXPECT_EQ(a.IsQuickSetsSupported(), b.IsQuickSetsSupported());
-    EXPECT_EQ(a.IsQuickSetsEnabled(), b.IsQuickSetsEnabled());
-    EXPECT_EQ(a.GetSelectedQuickSet(), b.GetSelectedQuickSet());
-    EXPECT_EQ(a.GetIsWidthBased(), b.GetIsWidthBased());
-    EXPECT_EQ(a.IsJobExpertSupported(), b.IsJobExpertSupported());
-    EXPECT_EQ(a.IsJobExpertEnabled(), b.IsJobExpertEnabled());
-    EXPECT_EQ(a.GetJobExpertRule(), b.GetJobExpertRule());
-    EXPECT_EQ(a.GetStatusEnable(), b.GetStatusEnable());
-    EXPECT_EQ(a.GetStatusCentralized(), b.GetStatusCentralized());
-    EXPECT_EQ(a.GetJobPresetAttched(), b.GetJobPresetAttched());
-    EXPECT_EQ(a.GetCustomInterval(), b.GetCustomInterval());
-    EXPECT_EQ(a.GetCustomTimeInterval(), b.GetCustomTimeInterval());
-    EXPECT_EQ(a.GetInputFormats(), b.GetInputFormats());
-}
-
-// The folder configuration as read back through every reader.
-inline FolderConfig ReadAll(const wxString& path)
-{
-    FolderConfig c;
-    EXPECT_EQ(db::HFDatabase::ReadSetting(path, c.setting), 1);
-    db::ConfigurationReader::ReadFolderConfiguration(path, c.folders);
-    db::ConfigurationReader::ReadJobConfiguration(path, c.job);
-    db::ConfigurationReader::ReadFilterConfiguration(path, c.filter);
-    db::ConfigurationReader::ReadImposeConfiguration(path, c.impose);
-    db::ConfigurationReader::ReadPreflightConfiguration(path, c.preflight);
+    FolderConfig c = name == "empty" ? FolderConfig() : FullFolderConfig();
+    db::Setting& s = c.setting;
+    if (name == "switches-off")
+    {
+        s.SetQuickSetsSupported(false);
+        s.EnableQuickSets(false);
+        s.SetIsWidthBased(false);
+        s.SetJobExpertSupported(false); // rule and switch stay set
+        s.SetStatusEnable(false);
+        s.SetStatusCentralized(false);
+        s.SetJobPresetAttched(false);
+        s.SetCustomInterval(false);
+        s.SetServerVersion(-42);
+    }
+    if (name == "other-filter-node")
+        c.filter.SetFilterSettingNode(
+            ParseNode("<FilterSettings><Filter name='x'/></FilterSettings>"));
     return c;
-}
-
-inline wxString NodeText(const wxXmlNode& node)
-{
-    wxXmlDocument document;
-    document.SetRoot(new wxXmlNode(node));
-    wxStringOutputStream out;
-    document.Save(out, 0);
-    return out.GetString();
-}
-
-inline void ExpectSameConfig(const FolderConfig& a, const FolderConfig& b)
-{
-    ExpectSameSetting(a.setting, b.setting);
-    EXPECT_EQ(a.folders.GetFailFolder(), b.folders.GetFailFolder());
-    EXPECT_EQ(a.folders.GetWorkFolder(), b.folders.GetWorkFolder());
-    EXPECT_EQ(a.folders.GetBackupFolder(), b.folders.GetBackupFolder());
-    EXPECT_EQ(a.folders.GetHotFolder(), b.folders.GetHotFolder());
-    EXPECT_EQ(a.job.GetProperties(), b.job.GetProperties());
-    EXPECT_EQ(a.impose.GetProperties(), b.impose.GetProperties());
-    EXPECT_EQ(a.preflight.GetProperties(), b.preflight.GetProperties());
-    EXPECT_EQ(NodeText(a.filter.GetFilterSettingNode()), NodeText(b.filter.GetFilterSettingNode()));
 }
 } // namespace storetest

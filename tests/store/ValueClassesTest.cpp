@@ -2,69 +2,37 @@
 #include <gtest/gtest.h>
 
 #include "FolderFixtures.h"
+#include "db/PluginInitialize.h"
 #include "db/ReadString.h"
 
 using storetest::ParseNode;
 
-TEST(SettingModel, NewSettingHasNoVersionAndEverySwitchOff)
-{
-    const db::Setting s;
-    EXPECT_EQ(s.GetServerVersion(), -1);
-    EXPECT_FALSE(s.GetStatusEnable() || s.GetStatusCentralized() || s.GetJobPresetAttched() ||
-                 s.GetCustomInterval() || s.IsQuickSetsSupported() || s.IsQuickSetsEnabled() ||
-                 s.GetIsWidthBased() || s.IsJobExpertSupported() || s.IsJobExpertEnabled());
-    const db::Setting::PairString format("EPS", "Encapsulated");
-    EXPECT_EQ(format.GetShortName(), "EPS");
-    EXPECT_EQ(format.GetDisplayName(), "Encapsulated");
-}
-
-TEST(JobConfigurationModel, SaveGetRemoveAndFlatText)
+TEST(KeyedConfigurations, ReplaceByExactKeyAndListAsKeyLines)
 {
     db::JobConfiguration job;
     wxString value = "untouched", display = "untouched", loc = "untouched";
     EXPECT_FALSE(job.GetProperty("PageSize", value, display, loc));
     EXPECT_EQ(value + display + loc, "untoucheduntoucheduntouched");
-
     job.SaveProperty("PageSize", "A4", "A4 shown", "A4 lokal");
     job.SaveProperty("PageSize", "A3", "A3 shown", "A3 lokal"); // replaces
     job.SaveProperty("Copies", "2", "two", "zwei");
     ASSERT_TRUE(job.GetProperty("PageSize", value, display, loc));
-    EXPECT_EQ(value, "A3");
-    EXPECT_EQ(display, "A3 shown");
-    EXPECT_EQ(loc, "A3 lokal");
+    EXPECT_EQ(value + "|" + display + "|" + loc, "A3|A3 shown|A3 lokal");
     EXPECT_FALSE(job.GetProperty("pagesize", value, display, loc)); // case-sensitive keys
-
     wxString text = "prefix\n";
     job.WriteToString(text);
     EXPECT_EQ(text, "prefix\n"
                     "<Key name=\"Copies\" value=\"2\" displayvalue=\"two\"/>\n"
                     "<Key name=\"PageSize\" value=\"A3\" displayvalue=\"A3 shown\"/>\n");
+    // Texts differing in one part only are different.
+    EXPECT_FALSE(db::JobSettingTexts("v", "d", "l") == db::JobSettingTexts("v", "d", "x"));
+    EXPECT_FALSE(db::SettingTexts("v", "d") == db::SettingTexts("v", "x"));
 
-    job.RemoveProperty("Copies");
-    EXPECT_EQ(job.GetProperties().size(), 1u);
-    job.RemoveAll();
-    wxString empty;
-    job.WriteToString(empty);
-    EXPECT_TRUE(empty.empty());
-}
-
-TEST(ImposeConfigurationModel, SaveGetAndFlatText)
-{
     db::ImposeConfiguration impose;
     impose.SaveProperty("Layout", "2up", "Two up");
-    impose.SaveProperty("Creep", "0.5", "Half");
-    wxString value, display;
     ASSERT_TRUE(impose.GetProperty("Layout", value, display));
-    EXPECT_EQ(value, "2up");
-    EXPECT_EQ(display, "Two up");
-    db::ImposeConfiguration::Map copy;
-    impose.GetProperties(copy);
-    db::ImposeConfiguration other;
-    other.SetProperties(copy);
-    wxString text;
-    other.WriteToString(text);
-    EXPECT_EQ(text, "<Key name=\"Creep\" value=\"0.5\" displayvalue=\"Half\"/>\n"
-                    "<Key name=\"Layout\" value=\"2up\" displayvalue=\"Two up\"/>\n");
+    EXPECT_EQ(value + "|" + display, "2up|Two up");
+    EXPECT_FALSE(impose.GetProperty("Creep", value, display));
 }
 
 TEST(PreflightModel, FirstStatusEntryDecidesWithoutRegardToCase)
@@ -77,6 +45,11 @@ TEST(PreflightModel, FirstStatusEntryDecidesWithoutRegardToCase)
     EXPECT_TRUE(preflight.IsPreflightEnabled());
     preflight.SetProperties({{"Status", "yes"}, {"Status", "true"}});
     EXPECT_FALSE(preflight.IsPreflightEnabled());
+    // Entries are equal only when key and value are.
+    using Entry = db::PreflightConfiguration::PairString;
+    EXPECT_FALSE(Entry("Status", "TRUE") == Entry("Status", "false"));
+    EXPECT_FALSE(Entry("Status", "TRUE") == Entry("Profile", "TRUE"));
+    EXPECT_FALSE(db::Setting::PairString("EPS", "a") == db::Setting::PairString("EPS", "b"));
 }
 
 TEST(FilterOutputFormat, DecidedByTheFilterOwnSettings)
@@ -98,7 +71,6 @@ TEST(FilterOutputFormat, DecidedByTheFilterOwnSettings)
     EXPECT_EQ(filter.GetOutputFormatForFilter("Orv.Office.1", "X"), "PS"); // later sibling
     EXPECT_EQ(filter.GetOutputFormatForFilter("Orv.eps.1", "X"), "");
     EXPECT_EQ(db::FilterConfiguration().GetOutputFormatForFilter("Orv.PDF.1", "PDF"), "");
-
     filter.SetFilterSettingNode(
         ParseNode("<FilterSetting><Filter name='Orv.EPS.1'><UI><OUTPUTFILETYPEEPS>1"
                   "</OUTPUTFILETYPEEPS><OUTPUTFILETYPEPS>1</OUTPUTFILETYPEPS></UI></Filter>"
@@ -115,4 +87,17 @@ TEST(ReadStringHelper, CopiesOnlyPresentKeys)
     EXPECT_EQ(out, "before");
     EXPECT_TRUE(db::ReadString(map, L"key", out));
     EXPECT_EQ(out, "value");
+}
+
+// A server that names no hardware margin has none: the custom page's
+// printable area is the whole sheet.
+TEST(CustomPageLimits, MarginsTheServerDoesNotNameAreZero)
+{
+    stCustomPageSizeAttribute custom;
+    ASSERT_TRUE(PluginInitialize::InitializeCustomPageSizeInfo(
+        "<S><CustomPageSizeInfo><MaxMediaWidth>900</MaxMediaWidth></CustomPageSizeInfo></S>",
+        custom));
+    EXPECT_EQ(custom.MaxMediaWidth, 900);
+    EXPECT_EQ(custom.LeftHWMargin + custom.RightHWMargin, 0);
+    EXPECT_EQ(custom.TopHWMargin + custom.BottomHWMargin, 0);
 }

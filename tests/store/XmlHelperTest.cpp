@@ -1,32 +1,95 @@
+// The XML helpers the configuration readers and writers are built on.
 #include <gtest/gtest.h>
 
-#include <cstdio>
+#include <sstream>
 #include <string>
-
-#include <unistd.h>
 
 #include <wx/log.h>
 #include <wx/sstream.h>
 
+#include "TestKit.h"
 #include "XmlHelper.h"
 
 namespace
 {
-std::unique_ptr<wxXmlDocument> Parse(const char* text)
+std::unique_ptr<wxXmlDocument> Parse(const std::string& text)
 {
     wxStringInputStream stream(wxString::FromUTF8(text));
     auto document = std::make_unique<wxXmlDocument>();
-    EXPECT_TRUE(document->Load(stream));
+    EXPECT_TRUE(document->Load(stream)) << text;
     return document;
 }
 
-// Attribute names and values in document order, "a=1;b=2;".
 std::string Attributes(const wxXmlNode* node)
 {
     std::string out;
     for (const wxXmlAttribute* a = node->GetAttributes(); a; a = a->GetNext())
         out += (a->GetName() + "=" + a->GetValue() + ";").ToStdString();
     return out;
+}
+
+WxStrAttributeMap Map(const std::string& text)
+{
+    WxStrAttributeMap map;
+    std::istringstream in(text);
+    for (std::string entry; std::getline(in, entry, ';');)
+        map[wxString::FromUTF8(entry.substr(0, entry.find('=')))] =
+            wxString::FromUTF8(entry.substr(entry.find('=') + 1));
+    return map;
+}
+
+std::string Id(const wxXmlNode* node)
+{
+    return node ? node->GetAttribute("id").ToStdString() : "(none)";
+}
+
+std::string Apply(const std::string& op, wxXmlNode* root, const std::string& arg)
+{
+    const std::string name = arg.substr(0, arg.find(' '));
+    wxXmlAttribute* attributes = root->GetAttributes();
+    if (op == "find")
+        return Id(CXmlNodeHelper::Find(root, name, arg.find(" deep") != std::string::npos));
+    if (op == "chain")
+    {
+        std::string ids;
+        for (wxXmlNode* n = CXmlNodeHelper::Find(root, name); n;
+             n = CXmlNodeHelper::FindNext(n, name))
+            ids += (ids.empty() ? "" : ",") + Id(n);
+        return ids.empty() ? "(none)" : ids;
+    }
+    if (op == "update")
+    {
+        const bool changed = CXmlNodeHelper::Update(root, Map(arg));
+        return (changed ? "yes " : "no ") + Attributes(root);
+    }
+    WxStrAttributeMap map = Map(arg);
+    std::string out;
+    if (op == "read")
+    {
+        CXmlNodeHelper::Read(root, map);
+        for (const auto& [key, value] : map)
+            out += (key + "=" + value + ";").ToStdString();
+        return out;
+    }
+    if (op == "subnodes")
+    {
+        CXmlNodeHelper::SetPropertyAsSubNode(root, map);
+        WxStrAttributeMap read;
+        CXmlNodeHelper::GetSubNodesAsProperty(root, read);
+        EXPECT_EQ(read, map);
+        for (const wxXmlNode* c = root->GetChildren(); c; c = c->GetNext())
+            out += (out.empty() ? "" : " ") + c->GetName().ToStdString() + ":" + Attributes(c);
+        return out;
+    }
+    if (op == "count")
+        return std::to_string(CXmlPropertyHelper::Count(attributes));
+    if (op == "attribute")
+    {
+        const wxXmlAttribute* found = CXmlPropertyHelper::Find(attributes, CStdStrW(arg));
+        return found ? found->GetValue().ToStdString() : "(none)";
+    }
+    const wxString value = CXmlPropertyHelper::ValueAt(attributes, std::stoul(arg));
+    return value.empty() ? "(empty)" : value.ToStdString();
 }
 
 // Counts error messages instead of printing them.
@@ -39,38 +102,30 @@ public:
 protected:
     void DoLogRecord(wxLogLevel level, const wxString& msg, const wxLogRecordInfo&) override
     {
-        if (level == wxLOG_Error)
-        {
-            ++errors;
-            last = msg.ToStdString();
-        }
+        errors += level == wxLOG_Error;
+        last = msg.ToStdString();
     }
 };
 } // namespace
 
-TEST(XmlFind, DirectChildWinsOverDeeperMatchUnderEarlierSibling)
+TEST(XmlHelper, CasesOfTheTable)
 {
-    auto doc = Parse("<r><a><x id='deep'/></a><x id='direct'/></r>");
-    wxXmlNode* found = CXmlNodeHelper::Find(doc->GetRoot(), "x", true);
-    ASSERT_NE(found, nullptr);
-    EXPECT_EQ(found->GetAttribute("id"), "direct");
+    const auto cases = testkit::ReadCaseTable("store/xml-helper.txt");
+    ASSERT_FALSE(cases.empty());
+    for (const testkit::CaseFields& c : cases)
+    {
+        ASSERT_EQ(c.size(), 5u);
+        SCOPED_TRACE(c[0] + " | " + c[1] + " | " + c[2]);
+        auto document = Parse(c[1]);
+        EXPECT_EQ(Apply(c[0], document->GetRoot(), c[2]), c[3]) << c[4];
+    }
 }
 
-TEST(XmlFind, RecursiveSearchVisitsSiblingsInDocumentOrderDepthFirst)
-{
-    auto doc = Parse("<r><a><b><x id='a-b'/></b></a><c><x id='c'/></c></r>");
-    wxXmlNode* found = CXmlNodeHelper::Find(doc->GetRoot(), "x", true);
-    ASSERT_NE(found, nullptr);
-    EXPECT_EQ(found->GetAttribute("id"), "a-b");
-    EXPECT_EQ(CXmlNodeHelper::Find(doc->GetRoot(), "x", false), nullptr);
-}
-
-TEST(XmlFind, MatchesOnlyElementsAndExactCase)
+TEST(XmlHelper, FindMatchesElementsOnly)
 {
     wxXmlNode parent(wxXML_ELEMENT_NODE, "r");
     parent.AddChild(new wxXmlNode(wxXML_TEXT_NODE, "x", "text"));
     parent.AddChild(new wxXmlNode(wxXML_COMMENT_NODE, "x", "comment"));
-    parent.AddChild(new wxXmlNode(wxXML_ELEMENT_NODE, "X"));
     EXPECT_EQ(CXmlNodeHelper::Find(&parent, "x", true), nullptr);
     wxXmlNode* element = new wxXmlNode(wxXML_ELEMENT_NODE, "x");
     parent.AddChild(element);
@@ -78,182 +133,42 @@ TEST(XmlFind, MatchesOnlyElementsAndExactCase)
     EXPECT_EQ(CXmlNodeHelper::Find(nullptr, "x", true), nullptr);
 }
 
-TEST(XmlFind, FindNextSkipsOtherNamesAndNonElements)
+TEST(XmlHelper, NarrowTextIsWidenedThroughTheLocaleBytesItCannotReadKept)
 {
-    auto doc = Parse("<r><x id='1'/><y/><!--x--><x id='2'/></r>");
-    wxXmlNode* first = CXmlNodeHelper::Find(doc->GetRoot(), "x");
-    wxXmlNode* second = CXmlNodeHelper::FindNext(first, "x");
-    ASSERT_NE(second, nullptr);
-    EXPECT_EQ(second->GetAttribute("id"), "2");
-    EXPECT_EQ(CXmlNodeHelper::FindNext(second, "x"), nullptr);
+    TESTKIT_USE_LOCALE(locale, "C.UTF-8");
+    EXPECT_EQ(CStdStrW("gr\xc3\xbc\xc3\x9f"), std::wstring(L"gr\u00fc\u00df"));
+    // Not UTF-8: one code point per byte, rather than nothing.
+    EXPECT_EQ(CStdStrW("a\xff\xc3"), std::wstring(L"a\u00ff\u00c3"));
+    EXPECT_EQ(CStdStrW(""), std::wstring());
+    EXPECT_EQ(CStdStrW(static_cast<const char*>(nullptr)), std::wstring());
+    EXPECT_EQ(CStdStrW(static_cast<const wchar_t*>(nullptr)), std::wstring());
 }
 
-template <typename Map> class XmlAttributeMaps : public ::testing::Test
+// A missing file is no error; a malformed one is reported once.
+TEST(XmlHelper, LoadGivesAnOwnedDocumentOrNull)
 {
-};
-using MapFlavours = ::testing::Types<StdStrAttributeMap, WxStrAttributeMap>;
-TYPED_TEST_SUITE(XmlAttributeMaps, MapFlavours);
-
-TYPED_TEST(XmlAttributeMaps, InsertAddsInKeyOrderAndRefusesEmptyMap)
-{
-    wxXmlNode node(wxXML_ELEMENT_NODE, "n");
-    TypeParam empty;
-    EXPECT_FALSE(CXmlNodeHelper::Insert(&node, empty));
-    EXPECT_EQ(node.GetAttributes(), nullptr);
-    TypeParam map;
-    map[L"b"] = L"2";
-    map[L"B"] = L"upper"; // code-point order puts upper case first
-    map[L"a"] = L"1";
-    EXPECT_TRUE(CXmlNodeHelper::Insert(&node, map));
-    EXPECT_EQ(Attributes(&node), "B=upper;a=1;b=2;");
-}
-
-TYPED_TEST(XmlAttributeMaps, UpdateKeepsPlacesRemovesMissingAppendsNew)
-{
-    auto doc = Parse("<n z='old' gone='x' a='old'/>");
-    wxXmlNode* node = doc->GetRoot();
-    TypeParam map;
-    map[L"a"] = L"new-a";
-    map[L"z"] = L"new-z";
-    map[L"m"] = L"added";
-    map[L"c"] = L"added-c";
-    EXPECT_TRUE(CXmlNodeHelper::Update(node, map));
-    EXPECT_EQ(Attributes(node), "z=new-z;a=new-a;c=added-c;m=added;");
-
-    TypeParam empty;
-    EXPECT_FALSE(CXmlNodeHelper::Update(node, empty));
-    EXPECT_EQ(Attributes(node), "z=new-z;a=new-a;c=added-c;m=added;");
-}
-
-TYPED_TEST(XmlAttributeMaps, UpdateCanRemoveTheFirstAndAllOldAttributes)
-{
-    auto doc = Parse("<n first='1' second='2'/>");
-    TypeParam map;
-    map[L"only"] = L"v";
-    EXPECT_TRUE(CXmlNodeHelper::Update(doc->GetRoot(), map));
-    EXPECT_EQ(Attributes(doc->GetRoot()), "only=v;");
-}
-
-TYPED_TEST(XmlAttributeMaps, ReadKeepsExistingKeysAndFirstDuplicate)
-{
-    wxXmlNode node(wxXML_ELEMENT_NODE, "n");
-    node.AddAttribute("k", "first");
-    node.AddAttribute("k", "second");
-    node.AddAttribute("other", "o");
-    TypeParam map;
-    map[L"other"] = L"kept";
-    CXmlNodeHelper::Read(&node, map);
-    EXPECT_EQ(map.size(), 2u);
-    EXPECT_EQ(map[L"k"], L"first");
-    EXPECT_EQ(map[L"other"], L"kept");
-}
-
-TYPED_TEST(XmlAttributeMaps, SubNodePropertiesRoundTripWithEmptyValues)
-{
-    wxXmlNode node(wxXML_ELEMENT_NODE, "n");
-    TypeParam written;
-    written[L"WIDTH"] = L"612";
-    written[L"EMPTY"] = L"";
-    written[L"\u00c4NDERUNG"] = L"\u00fc";
-    CXmlNodeHelper::SetPropertyAsSubNode(&node, written);
-    wxXmlNode* empty = CXmlNodeHelper::Find(&node, "EMPTY");
-    ASSERT_NE(empty, nullptr);
-    EXPECT_EQ(empty->GetAttributes(), nullptr);
-    EXPECT_EQ(CXmlNodeHelper::Find(&node, "WIDTH")->GetAttribute("value"), "612");
-
-    TypeParam read;
-    CXmlNodeHelper::GetSubNodesAsProperty(&node, read);
-    EXPECT_EQ(read, written);
-}
-
-TEST(XmlNodeHelper, RemoveChildrenLeavesNodeEmptyAndUsable)
-{
-    auto doc = Parse("<r><a><b/></a>text<c/></r>");
-    CXmlNodeHelper::RemoveChildren(doc->GetRoot());
-    EXPECT_EQ(doc->GetRoot()->GetChildren(), nullptr);
-    doc->GetRoot()->AddChild(new wxXmlNode(wxXML_ELEMENT_NODE, "d"));
-    EXPECT_NE(CXmlNodeHelper::Find(doc->GetRoot(), "d"), nullptr);
-}
-
-TEST(XmlPropertyHelper, CountExactFindAndValueByPosition)
-{
-    auto doc = Parse("<n a='1' Name='2' name='3'/>");
-    wxXmlAttribute* first = doc->GetRoot()->GetAttributes();
-    EXPECT_EQ(CXmlPropertyHelper::Count(first), 3u);
-    EXPECT_EQ(CXmlPropertyHelper::Count(nullptr), 0u);
-    wxXmlAttribute* found = CXmlPropertyHelper::Find(first, L"name");
-    ASSERT_NE(found, nullptr);
-    EXPECT_EQ(found->GetValue(), "3");
-    EXPECT_EQ(CXmlPropertyHelper::Find(first, L"nam"), nullptr);
-    // Positions past the end, and an empty list, read as "".
-    EXPECT_EQ(CXmlPropertyHelper::ValueAt(first, 1), "2");
-    EXPECT_EQ(CXmlPropertyHelper::ValueAt(first, 3), "");
-    EXPECT_EQ(CXmlPropertyHelper::ValueAt(nullptr, 0), "");
-}
-
-TEST(StdString, NarrowTextIsWidenedThroughTheLocale)
-{
-    const char* old = setlocale(LC_CTYPE, nullptr);
-    const std::string saved = old ? old : "C";
-    if (!setlocale(LC_CTYPE, "C.UTF-8"))
-        GTEST_SKIP() << "no C.UTF-8 locale";
-    EXPECT_EQ(CStdStr<wchar_t>("gr\xc3\xbc\xc3\x9f"), std::wstring(L"gr\u00fc\u00df"));
-    EXPECT_EQ(CStdStr<wchar_t>(static_cast<const char*>(nullptr)), std::wstring());
-    EXPECT_EQ(CStdStr<wchar_t>(static_cast<const wchar_t*>(nullptr)), std::wstring());
-    setlocale(LC_CTYPE, saved.c_str());
-}
-
-class XmlLoad : public ::testing::Test
-{
-protected:
-    void SetUp() override
-    {
-        char pattern[] = "/tmp/hf-xml-XXXXXX";
-        ASSERT_NE(mkdtemp(pattern), nullptr);
-        m_dir = pattern;
-        m_previous = wxLog::SetActiveTarget(&m_log);
-    }
-    void TearDown() override
-    {
-        wxLog::SetActiveTarget(m_previous);
-        std::remove((m_dir + "/f.xml").c_str());
-        rmdir(m_dir.c_str());
-    }
-    std::string Write(const char* content)
-    {
-        const std::string path = m_dir + "/f.xml";
-        FILE* f = fopen(path.c_str(), "wb");
-        fputs(content, f);
-        fclose(f);
-        return path;
-    }
-    std::string m_dir;
-    CountingLog m_log;
-    wxLog* m_previous = nullptr;
-};
-
-TEST_F(XmlLoad, MissingFileIsNullWithoutLogging)
-{
-    EXPECT_EQ(CXmlDocumentHelper::Load(CStdStr<wchar_t>(m_dir + "/none.xml"), L"UTF-8"), nullptr);
+    testkit::ScratchDir dir;
+    CountingLog log;
+    wxLog* previous = wxLog::SetActiveTarget(&log);
+    EXPECT_EQ(CXmlDocumentHelper::Load(CStdStrW(dir.File("none.xml")), L"UTF-8"), nullptr);
     wxLog::FlushActive();
-    EXPECT_EQ(m_log.errors, 0);
-}
+    EXPECT_EQ(log.errors, 0);
 
-TEST_F(XmlLoad, MalformedFileLogsOnceAndIsNull)
-{
-    const std::string path = Write("<r><unclosed></r>");
-    EXPECT_EQ(CXmlDocumentHelper::Load(CStdStr<wchar_t>(path), L"UTF-8"), nullptr);
+    testkit::WriteFile(dir.File("good.xml"), "<?xml version='1.0'?><r a='\xc3\xa4'/>");
+    std::unique_ptr<wxXmlDocument> good(
+        CXmlDocumentHelper::Load(CStdStrW(dir.File("good.xml")), L"UTF-8"));
+    ASSERT_NE(good, nullptr);
+    EXPECT_EQ(good->GetRoot()->GetAttribute("a"), wxString(L"\u00e4"));
     wxLog::FlushActive();
-    EXPECT_EQ(m_log.errors, 1);
-    EXPECT_EQ(m_log.last, "Cannot load Strings from file '" + path + "'.");
-}
+    EXPECT_EQ(log.errors, 0);
 
-TEST_F(XmlLoad, WellFormedFileGivesOwnedDocument)
-{
-    const std::string path = Write("<?xml version='1.0' encoding='UTF-8'?><r a='\xc3\xa4'/>");
-    std::unique_ptr<wxXmlDocument> doc(CXmlDocumentHelper::Load(CStdStr<wchar_t>(path), L"UTF-8"));
-    ASSERT_NE(doc, nullptr);
-    EXPECT_EQ(doc->GetRoot()->GetAttribute("a"), wxString(L"\u00e4"));
-    wxLog::FlushActive();
-    EXPECT_EQ(m_log.errors, 0);
+    for (const char* bad : {"<r><unclosed></r>", "", "<?xml version='1.0'?>"})
+    {
+        testkit::WriteFile(dir.File("bad.xml"), bad);
+        EXPECT_EQ(CXmlDocumentHelper::Load(CStdStrW(dir.File("bad.xml")), L"UTF-8"), nullptr);
+        wxLog::FlushActive();
+        EXPECT_EQ(log.last, "Cannot load Strings from file '" + dir.File("bad.xml") + "'.");
+    }
+    EXPECT_EQ(log.errors, 3);
+    wxLog::SetActiveTarget(previous);
 }

@@ -1,18 +1,16 @@
+// This client ships version 3.4, which keeps the default language.
 #include <gtest/gtest.h>
 #include <wx/intl.h>
 
 #include "ClientEnvironment.h"
 #include "utils/HFHelper.h"
 
-// This client ships version 3.4, which keeps the default language.
 namespace
 {
 [[maybe_unused]] ::testing::Environment* const g_environment =
     ::testing::AddGlobalTestEnvironment(new ClientEnvironment("Resources-3.4"));
 
-class OtherClientVersion : public RestoresCLocale
-{
-};
+using OtherClientVersion = RestoresCLocale;
 } // namespace
 
 TEST_F(OtherClientVersion, IgnoresTheWorkstationLanguage)

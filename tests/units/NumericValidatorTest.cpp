@@ -1,3 +1,5 @@
+// What a measure field accepts, by the application language's decimal
+// separator: as text, from a clone, and typed into a real text control.
 #include <cstdlib>
 #include <memory>
 
@@ -8,116 +10,80 @@
 #include <wx/textctrl.h>
 
 #include "NumericValidator.h"
-
-TEST(NumericValidatorText, CommaSeparatorAcceptsOnlyDigitsAndComma)
-{
-    wxString value;
-    const NumericValidator validator(&value, ",");
-    EXPECT_TRUE(validator.IsValid("8,5").empty());
-    EXPECT_TRUE(validator.IsValid("0123456789").empty());
-    for (const char* bad : {"8.5", "+8", "-8", "8e2", "8E2", "8a"})
-        EXPECT_FALSE(validator.IsValid(bad).empty()) << bad;
-}
-
-TEST(NumericValidatorText, PointSeparatorRefusesComma)
-{
-    wxString value;
-    const NumericValidator validator(&value, ".");
-    EXPECT_TRUE(validator.IsValid("8.5").empty());
-    for (const char* bad : {"8,5", "-1", "1e3"})
-        EXPECT_FALSE(validator.IsValid(bad).empty()) << bad;
-}
-
-TEST(NumericValidatorText, ExclusionOrderAndAnyOtherSeparator)
-{
-    EXPECT_EQ("+-eE.", NumericValidator::ExcludedCharacters(","));
-    EXPECT_EQ("+-eE,", NumericValidator::ExcludedCharacters("."));
-    // Anything but "." counts as a decimal comma language.
-    EXPECT_EQ("+-eE.", NumericValidator::ExcludedCharacters(""));
-}
-
-TEST(NumericValidatorText, CloneKeepsFilterAndBinding)
-{
-    wxString value;
-    const NumericValidator validator(&value, ",");
-    std::unique_ptr<wxObject> copy(validator.Clone());
-    auto* text = dynamic_cast<NumericValidator*>(copy.get());
-    ASSERT_NE(nullptr, text);
-    EXPECT_FALSE(text->IsValid("1.5").empty());
-    EXPECT_TRUE(text->IsValid("1,5").empty());
-}
+#include "TestKit.h"
 
 namespace
 {
-// A real text control needs the toolkit; run under a display (xvfb-run).
-class NumericValidatorWindow : public ::testing::Test
+// A real text control needs the toolkit and a display (xvfb-run).
+bool ToolkitStarted()
 {
-protected:
-    static void SetUpTestSuite()
+    static const bool started = []
     {
-        if (!std::getenv("DISPLAY"))
-            return;
         static int argc = 1;
         static wxChar arg0[] = wxT("numeric_validator_test");
         static wxChar* argv[] = {arg0, nullptr};
+        if (!std::getenv("DISPLAY"))
+            return false;
         wxApp::SetInstance(new wxApp);
-        s_started = wxEntryStart(argc, argv);
-    }
-    static void TearDownTestSuite()
-    {
-        if (s_started)
-            wxEntryCleanup();
-        s_started = false;
-    }
-
-    void SetUp() override
-    {
-        if (!s_started)
-            GTEST_SKIP() << "no display";
-        m_frame = new wxFrame(nullptr, wxID_ANY, "validator");
-        m_text = new wxTextCtrl(m_frame, wxID_ANY);
-        m_text->SetValidator(NumericValidator(&m_value, ","));
-    }
-    void TearDown() override
-    {
-        if (m_frame)
-            m_frame->Destroy();
-    }
-
-    // True when the validator lets the keystroke through to the control.
-    bool Accepts(wxChar c)
-    {
-        wxKeyEvent event(wxEVT_CHAR);
-        event.m_keyCode = c;
-        event.m_uniChar = c;
-        event.SetEventObject(m_text);
-        m_text->GetValidator()->ProcessEvent(event);
-        return event.GetSkipped();
-    }
-
-    static bool s_started;
-    wxFrame* m_frame = nullptr;
-    wxTextCtrl* m_text = nullptr;
-    wxString m_value;
-};
-bool NumericValidatorWindow::s_started = false;
-} // namespace
-
-TEST_F(NumericValidatorWindow, TransfersBoundStringBothWays)
-{
-    m_value = "8,5";
-    ASSERT_TRUE(m_text->GetValidator()->TransferToWindow());
-    EXPECT_EQ("8,5", m_text->GetValue());
-    m_text->ChangeValue("215,9");
-    ASSERT_TRUE(m_text->GetValidator()->TransferFromWindow());
-    EXPECT_EQ("215,9", m_value);
+        return wxEntryStart(argc, argv) && std::atexit(wxEntryCleanup) == 0;
+    }();
+    return started;
 }
 
-TEST_F(NumericValidatorWindow, FiltersKeystrokes)
+std::vector<testkit::CaseFields> Cases()
 {
+    auto cases = testkit::ReadCaseTable("units/numeric-validator.txt");
+    for (testkit::CaseFields& c : cases)
+        c[0] = c[0] == "\"\"" ? "" : c[0];
+    return cases;
+}
+} // namespace
+
+TEST(NumericValidatorText, CasesOfTheTableAlsoForAClone)
+{
+    const auto cases = Cases();
+    ASSERT_FALSE(cases.empty());
+    for (const testkit::CaseFields& c : cases)
+    {
+        wxString value;
+        const NumericValidator validator(&value, c[0]);
+        std::unique_ptr<wxObject> copy(validator.Clone());
+        const auto* clone = dynamic_cast<NumericValidator*>(copy.get());
+        ASSERT_NE(nullptr, clone);
+        EXPECT_EQ(validator.IsValid(c[1]).empty(), c[2] == "yes") << c[0] << " " << c[1];
+        EXPECT_EQ(clone->IsValid(c[1]).empty(), c[2] == "yes") << c[0] << " " << c[1];
+    }
+    EXPECT_EQ("+-eE.", NumericValidator::ExcludedCharacters(","));
+    EXPECT_EQ("+-eE,", NumericValidator::ExcludedCharacters("."));
+}
+
+TEST(NumericValidatorWindow, FiltersKeystrokesAndTransfersTheBoundString)
+{
+    if (!ToolkitStarted())
+        GTEST_SKIP() << "no display";
     wxValidator::SuppressBellOnError(true);
-    EXPECT_TRUE(Accepts('7'));
-    EXPECT_TRUE(Accepts(','));
-    for (wxChar bad : {'.', '+', '-', 'e', 'E', 'x'})
-        EXPECT_FALSE(Accepts(bad)) << static_cast<char>(bad);
+    wxFrame* frame = new wxFrame(nullptr, wxID_ANY, "validator");
+    wxTextCtrl* text = new wxTextCtrl(frame, wxID_ANY);
+    wxString value;
+    for (const testkit::CaseFields& c : Cases())
+    {
+        text->SetValidator(NumericValidator(&value, c[0]));
+        bool through = true; // every keystroke let through to the control
+        for (const wxUniChar typed : wxString(c[1]))
+        {
+            wxKeyEvent event(wxEVT_CHAR);
+            event.m_keyCode = event.m_uniChar = typed;
+            event.SetEventObject(text);
+            text->GetValidator()->ProcessEvent(event);
+            through = through && event.GetSkipped();
+        }
+        EXPECT_EQ(through, c[2] == "yes") << c[0] << " " << c[1];
+    }
+    value = "8,5";
+    ASSERT_TRUE(text->GetValidator()->TransferToWindow());
+    EXPECT_EQ("8,5", text->GetValue());
+    text->ChangeValue("215,9");
+    ASSERT_TRUE(text->GetValidator()->TransferFromWindow());
+    EXPECT_EQ("215,9", value);
+    frame->Destroy();
 }

@@ -1,127 +1,105 @@
+// Units, measures and the encodings of stored setting values.
 #include <gtest/gtest.h>
 
+#include <charconv>
+#include <sstream>
+
+#include "SettingsKeys.h"
+#include "TestKit.h"
 #include "Units.h"
 
 namespace
 {
-Unit_t BadUnit(int value)
+Unit_t UnitOf(const std::string& word)
 {
-    return static_cast<Unit_t>(value);
+    return word == "inch"    ? UNIT_INCH
+           : word == "mm"    ? UNIT_MM
+           : word == "point" ? UNIT_POINT
+                             : static_cast<Unit_t>(std::stoi(word));
 }
+
+std::string WordOf(Unit_t unit)
+{
+    return unit == UNIT_INCH ? "inch" : unit == UNIT_MM ? "mm" : "point";
+}
+
+std::string Result(bool ok, double value)
+{
+    char text[64];
+    const auto end = std::to_chars(text, text + sizeof text, value, std::chars_format::general, 15);
+    return (ok ? "yes " : "no ") + std::string(text, end.ptr);
+}
+
+// The case's answer in the form of the table's expected column.
+std::string Evaluate(const std::string& op, std::string input)
+{
+    if (input.size() >= 2 && input.front() == '"')
+        input = input.substr(1, input.size() - 2);
+    std::istringstream words(input);
+    std::string a, b, c;
+    words >> a >> b >> c;
+    double value = 0; // read with the classic C++ locale, whatever the C locale is
+    std::istringstream(a) >> value;
+    bool ok = true;
+    if (op == "convert")
+        ok = convertToUnit(value, UnitOf(b), UnitOf(c));
+    if (op == "adjust")
+        return Result(true, AdjustValue(value)).substr(4);
+    if (op == "cm-inch")
+    {
+        const auto unit = [](const std::string& w) {
+            return w == "cm" ? UNIT2_CM : w == "inch" ? UNIT2_INCH : static_cast<Unit2_t>(2);
+        };
+        ok = GetValueInUnits(value, unit(b), unit(c));
+    }
+    if (op == "format")
+        return formatUnit(value, UnitOf(b)).ToStdString();
+    if (op == "server-unit")
+        return WordOf(UnitFromServerWord(input));
+    if (op == "flag-on")
+        return IsSettingOn(input) ? "yes" : "no";
+    if (op == "flag-format")
+        return FormatSettingFlag(value != 0).ToStdString();
+    if (op == "double-format")
+        return FormatSettingDouble(value).ToStdString();
+    if (op == "int-format")
+        return FormatSettingInt(static_cast<long>(value)).ToStdString();
+    if (op == "parse-double")
+        ok = ParseSettingDouble(input, value);
+    if (op == "custom-unit")
+    {
+        Unit_t unit = UNIT_POINT;
+        ok = DecodeCustomPageUnit(input, unit);
+        return (ok ? "yes " : "no ") + WordOf(unit);
+    }
+    if (op == "read-flag") // the stored text ("(absent)": no entry) and the default
+    {
+        MapPropToValue settings(10);
+        if (a != "(absent)")
+            settings["K"] = a == "(empty)" ? "" : a;
+        ok = ReadSettingFlag(settings, "K", b == "1");
+        return (ok ? "yes" : "no") + std::string(settings.count("K") ? " listed" : "");
+    }
+    if (op == "default-dimension")
+        return DefaultOriginalDimension(input == "inch").ToStdString();
+    return Result(ok, value);
+}
+
 } // namespace
 
-TEST(ConvertToUnit, SameUnitLeavesValue)
+// Also run by ClientTest.cpp while the application language is German.
+void ExpectCasesOfTheValueTable()
 {
-    double v = 8.5;
-    EXPECT_TRUE(convertToUnit(v, UNIT_INCH, UNIT_INCH));
-    EXPECT_EQ(8.5, v);
+    const auto cases = testkit::ReadCaseTable("units/values.txt");
+    ASSERT_FALSE(cases.empty());
+    for (const testkit::CaseFields& c : cases)
+    {
+        ASSERT_EQ(c.size(), 4u);
+        EXPECT_EQ(Evaluate(c[0], c[1]), c[2]) << c[0] << " " << c[1] << ": " << c[3];
+    }
 }
 
-TEST(ConvertToUnit, InvalidSourceFailsTowardsInchAndPointOnly)
+TEST(UnitsAndSettingValues, CasesOfTheTable)
 {
-    double v = 3.0;
-    EXPECT_FALSE(convertToUnit(v, BadUnit(5), UNIT_INCH));
-    EXPECT_EQ(3.0, v);
-    EXPECT_FALSE(convertToUnit(v, BadUnit(5), UNIT_POINT));
-    EXPECT_EQ(3.0, v);
-    EXPECT_TRUE(convertToUnit(v, BadUnit(5), UNIT_MM));
-    EXPECT_EQ(3.0, v);
-    // An unknown target does nothing and is not an error.
-    EXPECT_TRUE(convertToUnit(v, UNIT_INCH, BadUnit(9)));
-    EXPECT_EQ(3.0, v);
-}
-
-TEST(ConvertToUnit, PointsToInchAndMillimetre)
-{
-    double inch = 612;
-    EXPECT_TRUE(convertToUnit(inch, UNIT_POINT, UNIT_INCH));
-    EXPECT_DOUBLE_EQ(8.5, inch);
-    double mm = 612;
-    EXPECT_TRUE(convertToUnit(mm, UNIT_POINT, UNIT_MM));
-    EXPECT_DOUBLE_EQ(215.9, mm);
-}
-
-TEST(ConvertToUnit, MillimetreToPointIsNotRounded)
-{
-    double v = 210;
-    EXPECT_TRUE(convertToUnit(v, UNIT_MM, UNIT_POINT));
-    EXPECT_DOUBLE_EQ(595.2755905511812, v);
-    double inch = 2;
-    EXPECT_TRUE(convertToUnit(inch, UNIT_INCH, UNIT_POINT));
-    EXPECT_EQ(144.0, inch);
-}
-
-TEST(ConvertToUnit, RoundTripsThroughEveryPair)
-{
-    const Unit_t units[] = {UNIT_INCH, UNIT_MM, UNIT_POINT};
-    for (Unit_t from : units)
-        for (Unit_t to : units)
-        {
-            double v = 123.456;
-            convertToUnit(v, from, to);
-            convertToUnit(v, to, from);
-            EXPECT_NEAR(123.456, v, 1e-9) << from << " -> " << to;
-        }
-}
-
-TEST(AdjustValue, KeepsValueUnlessThirdDecimalIsSixOrMore)
-{
-    double keep = 2.2456;
-    EXPECT_EQ(2.2456, AdjustValue(keep));
-    double drop = 2.2467;
-    EXPECT_EQ(2.0, AdjustValue(drop));
-    EXPECT_EQ(2.0, drop);
-    double eight = 8.506;
-    EXPECT_EQ(8.0, AdjustValue(eight));
-    double stays = 8.505;
-    EXPECT_EQ(8.505, AdjustValue(stays));
-}
-
-TEST(AdjustValue, NegativeAndHugeValuesStay)
-{
-    double negative = -2.2467;
-    EXPECT_EQ(-2.2467, AdjustValue(negative));
-    double huge = 1e12 + 0.009;
-    EXPECT_EQ(1e12 + 0.009, AdjustValue(huge));
-}
-
-TEST(GetValueInUnits, FactorTwoPointFiveFourBothWays)
-{
-    double v = 2.54;
-    EXPECT_TRUE(GetValueInUnits(v, UNIT2_CM, UNIT2_INCH));
-    EXPECT_DOUBLE_EQ(1.0, v);
-    EXPECT_TRUE(GetValueInUnits(v, UNIT2_INCH, UNIT2_CM));
-    EXPECT_DOUBLE_EQ(2.54, v);
-    EXPECT_TRUE(GetValueInUnits(v, UNIT2_INCH, UNIT2_INCH));
-    EXPECT_DOUBLE_EQ(2.54, v);
-    EXPECT_FALSE(GetValueInUnits(v, static_cast<Unit2_t>(2), UNIT2_CM));
-    EXPECT_DOUBLE_EQ(2.54, v);
-}
-
-TEST(FormatUnit, TwoDecimalsAndSuffix)
-{
-    EXPECT_EQ("8.50in", formatUnit(8.5, UNIT_INCH));
-    EXPECT_EQ("215.90mm", formatUnit(215.9, UNIT_MM));
-    EXPECT_EQ("612.00pt", formatUnit(612, UNIT_POINT));
-    EXPECT_EQ("612.00pt", formatUnit(612, BadUnit(7)));
-    EXPECT_EQ("0.01in", formatUnit(0.005000001, UNIT_INCH));
-}
-
-TEST(FormatUnit, PointStaysUnderDecimalCommaLocale)
-{
-    const std::string saved = setlocale(LC_ALL, nullptr);
-    if (!setlocale(LC_ALL, "de_DE.UTF-8"))
-        GTEST_SKIP() << "de_DE.UTF-8 is not installed (scripts/setup.sh)";
-    const wxString text = formatUnit(8.5, UNIT_INCH);
-    setlocale(LC_ALL, saved.c_str());
-    EXPECT_EQ("8.50in", text);
-}
-
-TEST(UnitFromServerWord, KnownWordsElseInch)
-{
-    EXPECT_EQ(UNIT_INCH, UnitFromServerWord("inch"));
-    EXPECT_EQ(UNIT_MM, UnitFromServerWord("mm"));
-    EXPECT_EQ(UNIT_POINT, UnitFromServerWord("point"));
-    EXPECT_EQ(UNIT_INCH, UnitFromServerWord("MM"));
-    EXPECT_EQ(UNIT_INCH, UnitFromServerWord(""));
+    ExpectCasesOfTheValueTable();
 }
