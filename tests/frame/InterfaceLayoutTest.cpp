@@ -1,9 +1,15 @@
 // Hosts and modules are built apart: the slot of every virtual function of
-// the interface must stay where hosts expect it.
+// the interface must stay where hosts expect it. And the default host
+// services: catalogues compiled from the repository's .po files and found
+// beside the library, and the theme service.
 #include <cstring>
+#include <iterator>
 
 #include <gtest/gtest.h>
 #include <hotfolder/HFPlugin.h>
+#include <hotfolder/HFTranslations.h>
+#include <hotfolder/Themer.h>
+#include <wx/translation.h>
 
 namespace
 {
@@ -24,29 +30,26 @@ template <typename F> long SlotOf(F function)
 
 TEST(InterfaceLayout, SlotsInHostOrder)
 {
-    EXPECT_EQ(SlotOf(&HFPlugin::Initialize), 2);
-    EXPECT_EQ(SlotOf(&HFPlugin::InitilaizeFromPreference), 3);
-    EXPECT_EQ(SlotOf(&HFPlugin::GetVersion), 4);
-    EXPECT_EQ(SlotOf(&HFPlugin::GetDisplayName), 5);
-    EXPECT_EQ(SlotOf(&HFPlugin::GetShortName), 6);
-    EXPECT_EQ(SlotOf(&HFPlugin::GetSupportedFileExtensions), 7);
-    EXPECT_EQ(SlotOf(&HFPlugin::GetGroupType), 8);
-    EXPECT_EQ(SlotOf(&HFPlugin::ShowPluginUI), 9);
-    EXPECT_EQ(SlotOf(&HFPlugin::GetErrorString), 10);
-    EXPECT_EQ(SlotOf(&HFPlugin::SniffFiles), 11);
-    using WithContent =
+    using Sniff = long (HFPlugin::*)(const wxString&, wxArrayString&, JobInfoCollection&);
+    using SniffWithContent =
         long (HFPlugin::*)(const wxString&, wxArrayString&, JobInfoCollection&, FolderContent*&);
-    using WithoutContent = long (HFPlugin::*)(const wxString&, wxArrayString&, JobInfoCollection&);
-    EXPECT_EQ(SlotOf(static_cast<WithContent>(&HFPlugin::SniffFolder)), 12);
-    EXPECT_EQ(SlotOf(static_cast<WithoutContent>(&HFPlugin::SniffFolder)), 13);
-    EXPECT_EQ(SlotOf(&HFPlugin::Process), 14);
-    EXPECT_EQ(SlotOf(&HFPlugin::SavePreference), 15);
-    EXPECT_EQ(SlotOf(&HFPlugin::LoadPreference), 16);
-    EXPECT_EQ(SlotOf(&HFPlugin::IsInitialized), 17);
-    EXPECT_EQ(SlotOf(&HFPlugin::DeInitialize), 18);
-    EXPECT_EQ(SlotOf(&HFPlugin::GetServerKeys), 19);
-    EXPECT_EQ(SlotOf(&HFPlugin::IsMergeEnabled), 20);
-    EXPECT_EQ(SlotOf(&HFPlugin::EnableMerge), 21);
+    const long withContent = SlotOf(static_cast<SniffWithContent>(&HFPlugin::SniffFolder));
+    const long withoutContent = SlotOf(static_cast<Sniff>(&HFPlugin::SniffFolder));
+    // Slots 0 and 1 hold the destructors; the functions follow in this order.
+#define SLOT(function) SlotOf(&HFPlugin::function)
+    const long slots[] = {SLOT(Initialize),     SLOT(InitilaizeFromPreference),
+                          SLOT(GetVersion),     SLOT(GetDisplayName),
+                          SLOT(GetShortName),   SLOT(GetSupportedFileExtensions),
+                          SLOT(GetGroupType),   SLOT(ShowPluginUI),
+                          SLOT(GetErrorString), SLOT(SniffFiles),
+                          withContent,          withoutContent,
+                          SLOT(Process),        SLOT(SavePreference),
+                          SLOT(LoadPreference), SLOT(IsInitialized),
+                          SLOT(DeInitialize),   SLOT(GetServerKeys),
+                          SLOT(IsMergeEnabled), SLOT(EnableMerge)};
+#undef SLOT
+    for (long i = 0; i < static_cast<long>(std::size(slots)); ++i)
+        EXPECT_EQ(slots[i], i + 2) << "function number " << i + 1;
     EXPECT_EQ(SlotOf(&IProgressTracker::ReportProgress), 0);
 }
 
@@ -69,7 +72,7 @@ TEST(InterfaceLayout, DescriptionRecordOrder)
 TEST(JobCollection, OwnsCopiesInOrder)
 {
     ReadyToProcessJobInfo job;
-    job.filterId = "Orv.EPS.1";
+    EXPECT_EQ(job.auxValue, 0u); // a new job carries no value
     job.jobName = "a.eps";
     job.files.Add("/in/a.eps");
     job.auxValue = 7;
@@ -78,10 +81,41 @@ TEST(JobCollection, OwnsCopiesInOrder)
     job.jobName = "b.eps";
     jobs.Add(job);
     ASSERT_EQ(jobs.GetCount(), 3u);
-    EXPECT_EQ(jobs[0].jobName, "a.eps");
-    EXPECT_EQ(jobs[1].jobName, "a.eps");
-    EXPECT_EQ(jobs[2].jobName, "b.eps");
+    EXPECT_EQ(jobs[0].jobName + jobs[1].jobName + jobs[2].jobName, "a.epsa.epsb.eps");
     EXPECT_NE(&jobs[0], &jobs[1]);
     EXPECT_EQ(jobs[1].files[0], "/in/a.eps");
     EXPECT_EQ(jobs[1].auxValue, 7u);
+}
+
+TEST(Translations, CataloguesBesideTheLibrary)
+{
+    HFTranslations* service = HFTranslations::GetInstance();
+    ASSERT_EQ(service, HFTranslations::GetInstance());
+    const wxArrayString languages = service->AvailableLanguages();
+    EXPECT_NE(languages.Index("de"), wxNOT_FOUND) << service->CatalogDirectory();
+    EXPECT_NE(languages.Index("fr"), wxNOT_FOUND);
+    // Every language's word, English first; a word no catalogue knows is only itself.
+    const wxArrayString inch = service->GetTranslations("inch");
+    EXPECT_TRUE(inch[0] == "inch" && inch.Index("Zoll") > 0 && inch.Index("pouce") > 0);
+    EXPECT_EQ(service->GetTranslations("no such word"), wxArrayString(1, "no such word"));
+
+    // The selected language reaches the toolkit's own lookups.
+    ASSERT_TRUE(service->SelectLanguage("de"));
+    EXPECT_EQ(service->Translate("Top Left"), "Oben links");
+    EXPECT_EQ(wxGetTranslation("Invalid input file"), wxString::FromUTF8("Ungültige Eingabedatei"));
+    EXPECT_EQ(service->Translate("not in the catalogue"), "not in the catalogue");
+    EXPECT_FALSE(service->SelectLanguage("xx"));
+    EXPECT_EQ(service->GetSelectedLanguage(), "");
+    EXPECT_EQ(service->Translate("Top Left"), "Top Left");
+    EXPECT_EQ(wxGetTranslation("Invalid input file"), "Invalid input file");
+    EXPECT_TRUE(service->SelectLanguage("en"));
+}
+
+TEST(Theme, HeaderStripIsDarkWithBoldWhiteText)
+{
+    const stTheme header = Themer::GetThemeService()->GetTheme("HeaderView");
+    EXPECT_EQ(header.m_background, wxColour(0x3b, 0x4a, 0x5a));
+    EXPECT_EQ(header.m_foreground, *wxWHITE);
+    EXPECT_EQ(header.m_font.GetPointSize(), 11);
+    EXPECT_EQ(header.m_font.GetWeight(), wxFONTWEIGHT_BOLD);
 }
