@@ -13,8 +13,6 @@
 #include <wx/stopwatch.h>
 #include <wx/textctrl.h>
 
-#include "GhostscriptOracle.h"
-
 namespace
 {
 bool g_guiAvailable = false;
@@ -42,7 +40,7 @@ protected:
     {
         if (g_realModalAllowed)
             return wxID_NONE;
-        ADD_FAILURE() << "unexpected modal dialog: " << dialog->GetTitle().ToStdString() << " / "
+        ADD_FAILURE() << "unexpected modal dialog: " << dialog->GetTitle() << " / "
                       << dialog->GetClassInfo()->GetClassName();
         return wxID_CANCEL;
     }
@@ -52,26 +50,13 @@ protected:
 
 namespace ui_test
 {
-bool GuiAvailable()
-{
-    return g_guiAvailable;
-}
-
 RealModalScope::RealModalScope()
 {
     g_realModalAllowed = true;
 }
-
 RealModalScope::~RealModalScope()
 {
     g_realModalAllowed = false;
-}
-
-wxFrame* CreateHostFrame()
-{
-    auto* frame = new wxFrame(nullptr, wxID_ANY, "settings", wxDefaultPosition, wxSize(520, 720));
-    frame->Show();
-    return frame;
 }
 
 void Pump(int milliseconds)
@@ -85,37 +70,37 @@ void Pump(int milliseconds)
     } while (watch.Time() < milliseconds);
 }
 
+// Sends the command event a control sends when the user changes it.
+static void Send(wxWindow* control, wxEventType type, int value, const wxString& text = "")
+{
+    wxCommandEvent event(type, control->GetId());
+    event.SetEventObject(control);
+    event.SetInt(value);
+    event.SetString(text);
+    control->HandleWindowEvent(event);
+}
+
 void ClickRadio(wxRadioButton* radio)
 {
     ASSERT_NE(nullptr, radio);
     radio->SetValue(true);
-    wxCommandEvent event(wxEVT_RADIOBUTTON, radio->GetId());
-    event.SetEventObject(radio);
-    event.SetInt(1);
-    radio->HandleWindowEvent(event);
+    Send(radio, wxEVT_RADIOBUTTON, 1);
 }
 
 void ToggleCheck(wxCheckBox* check)
 {
     ASSERT_NE(nullptr, check);
     check->SetValue(!check->GetValue());
-    wxCommandEvent event(wxEVT_CHECKBOX, check->GetId());
-    event.SetEventObject(check);
-    event.SetInt(check->GetValue());
-    check->HandleWindowEvent(event);
+    Send(check, wxEVT_CHECKBOX, check->GetValue());
 }
 
 void SelectComboItem(wxComboBox* combo, const wxString& item)
 {
     ASSERT_NE(nullptr, combo);
     const int index = combo->FindString(item, true);
-    ASSERT_NE(wxNOT_FOUND, index) << item.ToStdString();
+    ASSERT_NE(wxNOT_FOUND, index) << item;
     combo->SetSelection(index);
-    wxCommandEvent event(wxEVT_COMBOBOX, combo->GetId());
-    event.SetEventObject(combo);
-    event.SetInt(index);
-    event.SetString(item);
-    combo->HandleWindowEvent(event);
+    Send(combo, wxEVT_COMBOBOX, index, item);
 }
 
 void TypeText(wxTextCtrl* field, const wxString& text)
@@ -123,30 +108,15 @@ void TypeText(wxTextCtrl* field, const wxString& text)
     ASSERT_NE(nullptr, field);
     field->ChangeValue(text);
     field->SetInsertionPointEnd();
-    wxCommandEvent event(wxEVT_TEXT, field->GetId());
-    event.SetEventObject(field);
-    event.SetString(text);
-    field->HandleWindowEvent(event);
-}
-
-wxString TestDataText(const wxString& relative)
-{
-    return testkit::ReadFile(std::string(HF_TEST_DATA_DIR) + "/" + relative.ToStdString());
-}
-
-std::map<std::string, std::string> Sorted(const MapPropToValue& settings)
-{
-    std::map<std::string, std::string> sorted;
-    for (const auto& entry : settings)
-        sorted[entry.first.ToStdString()] = entry.second.ToStdString(wxConvUTF8);
-    return sorted;
+    Send(field, wxEVT_TEXT, 0, text);
 }
 
 void GuiTest::SetUp()
 {
-    if (!GuiAvailable())
+    if (!g_guiAvailable)
         GTEST_SKIP() << "no display";
-    m_frame = CreateHostFrame();
+    m_frame = new wxFrame(nullptr, wxID_ANY, "settings", wxDefaultPosition, wxSize(520, 720));
+    m_frame->Show();
 }
 
 void GuiTest::TearDown()

@@ -1,7 +1,8 @@
 #pragma once
 // Shared by the settings panel GUI tests: a toolkit started once per test
-// program, asserts that fail the test instead of popping up, and helpers
-// that drive controls the way the toolkit reports user actions.
+// program, asserts that fail the test instead of popping up, a hook that
+// fails on any modal dialog no wxTEST_DIALOG expects, and helpers that drive
+// controls the way the toolkit reports user actions.
 #include <map>
 #include <string>
 
@@ -10,21 +11,16 @@
 
 #include <hotfolder/MapPropToValue.h>
 
+#include "TestKit.h"
+
 class wxCheckBox;
 class wxComboBox;
 class wxFrame;
 class wxRadioButton;
 class wxTextCtrl;
-class wxWindow;
 
 namespace ui_test
 {
-// False when no display is available; GUI tests then skip.
-bool GuiAvailable();
-
-// A shown top-level frame to host a panel; destroyed by the fixture.
-wxFrame* CreateHostFrame();
-
 // Let pending events run for a while (ms).
 void Pump(int milliseconds = 50);
 
@@ -35,25 +31,31 @@ void ToggleCheck(wxCheckBox* check);
 void SelectComboItem(wxComboBox* combo, const wxString& item);
 void TypeText(wxTextCtrl* field, const wxString& text);
 
-// The text of a file in the test data folder.
-wxString TestDataText(const wxString& relative);
+inline wxString TestDataText(const wxString& relative)
+{
+    return wxString::FromUTF8(testkit::ReadFile(HF_TEST_DATA_DIR "/" + relative.ToStdString()));
+}
 
 // A map as an ordered std::map, for whole-map comparisons with readable
 // failure output.
-std::map<std::string, std::string> Sorted(const MapPropToValue& settings);
+inline std::map<std::string, std::string> Sorted(const MapPropToValue& settings)
+{
+    std::map<std::string, std::string> sorted;
+    for (const auto& entry : settings)
+        sorted[entry.first.ToStdString()] = entry.second.ToStdString(wxConvUTF8);
+    return sorted;
+}
 
 // While it lives, modal dialogs run for real instead of failing the test
 // (for tests that end them with simulated keys and a guard timer).
-class RealModalScope
+struct RealModalScope
 {
-public:
     RealModalScope();
     ~RealModalScope();
-    RealModalScope(const RealModalScope&) = delete;
-    RealModalScope& operator=(const RealModalScope&) = delete;
 };
 
-// Base fixture: skips without a display, cleans up the frame afterwards.
+// Base fixture: skips without a display; a shown frame hosts the test's
+// windows and is destroyed afterwards.
 class GuiTest : public ::testing::Test
 {
 protected:

@@ -25,12 +25,7 @@ TEST_F(PanelConversion, SavedChoicesPlaceAndSizeTheArtwork)
     m_panel = wxDynamicCast(filter.ShowPluginUI(m_frame), ImageSizePanelWithoutMerge);
     ASSERT_NE(nullptr, m_panel);
     EXPECT_EQ("0", filter.GetSettings()["CUSTOMPAGETUNIT"]); // the server prefers inches
-
-    ClickRadio(Radio(ID_OUTPUT_PS_RADIO));
-    wxTEST_DIALOG(ClickButton(ID_CUSTOMPAGESIZE_BUTTON), EnterCustomSizeInPoints("500", "700"));
-    SelectComboItem(Combo(ID_IMAGEPOSITION_COMBO), "Bottom Left");
-    ClickRadio(Radio(ID_CUSTOMSIZE_RADIO));
-    TypeText(Text(ID_WIDTH_TEXT), "2");
+    RunSteps("click ps; custom 500 700; select position=Bottom Left; click custom; type width=2");
 
     wxXmlNode host(wxXML_ELEMENT_NODE, "Filter");
     ASSERT_EQ(0, filter.SavePreference(&host));
@@ -43,14 +38,14 @@ TEST_F(PanelConversion, SavedChoicesPlaceAndSizeTheArtwork)
     ASSERT_EQ(0, processing.Initialize(TestDataText("ui/server-ui.xml")));
     ASSERT_EQ(0, processing.InitilaizeFromPreference(&host));
 
-    const sample::ScratchDir folder;
-    const wxString input = folder.File("art.eps"), output = folder.File("art.ps");
-    ASSERT_TRUE(sample::WriteFile(input, sample::RectangleEps(0, 0, 100, 50)));
+    const testkit::ScratchDir folder;
+    const std::string input = folder.File("art.eps"), output = folder.File("art.ps");
+    ASSERT_TRUE(testkit::WriteFile(input, sample::RectangleEps(0, 0, 100, 50)));
     void* context = nullptr;
-    ASSERT_EQ(1u, IsThisEPS(input.fn_str(), &context));
-    ASSERT_EQ(1, ConvertEPStoPS(&context, &processing.GetParams(), output.fn_str()));
+    ASSERT_EQ(1u, IsThisEPS(input.c_str(), &context));
+    ASSERT_EQ(1, ConvertEPStoPS(&context, &processing.GetParams(), output.c_str()));
 
-    const hf_test::GhostscriptReport report = hf_test::RunGhostscriptBBox(output.ToStdString());
+    const hf_test::GhostscriptReport report = hf_test::RunGhostscriptBBox(output);
     ASSERT_FALSE(report.postscriptError) << report.process.err;
     ASSERT_TRUE(report.marked);
     EXPECT_NEAR(500, report.pageWidth, 0.5);

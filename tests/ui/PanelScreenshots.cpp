@@ -48,22 +48,6 @@ bool SaveWindows(const std::vector<std::pair<wxWindow*, wxString>>& shots)
     return ok;
 }
 
-wxString ReadFile(const wxString& path)
-{
-    wxString text;
-    if (FILE* file = fopen(path.mb_str(), "rb"))
-    {
-        char buffer[4096];
-        size_t read = 0;
-        std::string bytes;
-        while ((read = fread(buffer, 1, sizeof buffer, file)) > 0)
-            bytes.append(buffer, read);
-        fclose(file);
-        text = wxString::FromUTF8(bytes.c_str());
-    }
-    return text;
-}
-
 class ScreenshotApp : public wxApp
 {
 public:
@@ -77,7 +61,8 @@ public:
         HFTranslations::GetInstance()->SelectLanguage(language);
 
         auto* frame = new wxFrame(nullptr, wxID_ANY, "EPS", wxPoint(0, 0));
-        const wxString xml = ReadFile(wxString(HF_TEST_DATA_DIR) + "/ui/server-ui.xml");
+        const wxString xml =
+            wxString::FromUTF8(testkit::ReadFile(HF_TEST_DATA_DIR "/ui/server-ui.xml"));
         auto* panel = wxDynamicCast(ImageSizePanelWithoutMerge_Factory::CreateInstance(
                                         frame, xml, "EPS", ".eps", true, true),
                                     ImageSizePanelWithoutMerge);
@@ -129,11 +114,7 @@ int main(int argc, char** argv)
     // The German pictures show what a German user sees: the application
     // language, and with it the panel's decimal separator, come from the
     // client configuration, not only the catalogue.
-    std::filesystem::path germanHome;
     if (argc >= 3 && std::string(argv[2]) == "de")
-        germanHome = UseGermanClientConfiguration("screenshots");
-    const int status = wxEntry(argc, argv);
-    if (!germanHome.empty())
-        std::filesystem::remove_all(germanHome);
-    return status;
+        UseGermanClientConfiguration();
+    return wxEntry(argc, argv);
 }

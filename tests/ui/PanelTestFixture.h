@@ -1,15 +1,17 @@
 #pragma once
-// A settings panel built by the factory from a test server description.
+// A settings panel built by the factory from a test server description, and
+// a driver for the panel scenarios of the case tables under tests/data/ui:
+// one scenario a line, its steps separated by "; " (see panel-scenarios.txt).
 #include <wx/button.h>
 #include <wx/checkbox.h>
 #include <wx/combobox.h>
 #include <wx/frame.h>
 #include <wx/msgdlg.h>
-#include <wx/testing.h>
 #include <wx/radiobut.h>
+#include <wx/testing.h>
 #include <wx/textctrl.h>
 
-#include "ControlIds.h"
+#include "ControlNames.h"
 #include "CustomPageSizeDlg.h"
 #include "GuiTestSupport.h"
 #include "ImageSizePanelWithoutMerge.h"
@@ -18,14 +20,11 @@
 namespace ui_test
 {
 // Answers the custom page size dialog: switches it to points, types the
-// size and presses OK (with OK's own checks).
+// size in the field's notation and presses OK (with OK's own checks).
 class EnterCustomSizeInPoints : public wxExpectModalBase<CustomPageSizeDlg>
 {
 public:
-    EnterCustomSizeInPoints(wxString width, wxString height)
-        : m_width(std::move(width)), m_height(std::move(height))
-    {
-    }
+    EnterCustomSizeInPoints(wxString width, wxString height) : m_width(width), m_height(height) {}
 
 protected:
     int OnInvoked(CustomPageSizeDlg* dialog) const override
@@ -33,8 +32,7 @@ protected:
         ClickRadio(wxDynamicCast(dialog->FindWindow(ID_CUSTOM_UNIT_POINT), wxRadioButton));
         auto* width = wxDynamicCast(dialog->FindWindow(ID_CUSTOM_WIDTH_TEXT), wxTextCtrl);
         auto* height = wxDynamicCast(dialog->FindWindow(ID_CUSTOM_HEIGHT_TEXT), wxTextCtrl);
-        // The fields are typed in the locale's notation, as shown ("612.00").
-        const wxString point = width->GetValue().Right(3).Left(1);
+        const wxString point = width->GetValue().Right(3).Left(1); // shown as "612.00"
         wxString w = m_width, h = m_height;
         w.Replace(".", point);
         h.Replace(".", point);
@@ -62,8 +60,7 @@ public:
 protected:
     int OnInvoked(wxMessageDialog* dialog) const override
     {
-        EXPECT_NE(wxNOT_FOUND, dialog->GetMessage().Find(m_part))
-            << dialog->GetMessage().ToStdString();
+        EXPECT_NE(wxNOT_FOUND, dialog->GetMessage().Find(m_part)) << dialog->GetMessage();
         return wxID_OK;
     }
 
@@ -74,23 +71,14 @@ private:
 class PanelTest : public GuiTest
 {
 protected:
-    ImageSizePanelWithoutMerge* Build(bool enabled = true,
-                                      const wxString& server = "ui/server-ui.xml")
+    ImageSizePanelWithoutMerge* Build(bool enabled = true, const wxString& server = "ui")
     {
-        const wxString xml = TestDataText(server);
-        wxWindow* window = ImageSizePanelWithoutMerge_Factory::CreateInstance(
-            m_frame, xml, "EPS", ".eps", enabled, enabled);
-        m_panel = wxDynamicCast(window, ImageSizePanelWithoutMerge);
+        const wxString xml = TestDataText("ui/server-" + server + ".xml");
+        m_panel = wxDynamicCast(ImageSizePanelWithoutMerge_Factory::CreateInstance(
+                                    m_frame, xml, "EPS", ".eps", enabled, enabled),
+                                ImageSizePanelWithoutMerge);
         m_frame->Layout();
         return m_panel;
-    }
-
-    // Builds the panel and loads settings with PostScript output chosen.
-    void BuildAndLoadPs(MapPropToValue& settings)
-    {
-        Build();
-        settings["OUTPUTFILETYPEEPS"] = "0";
-        m_panel->LoadUISettings(settings);
     }
 
     // What the host does on OK.
@@ -100,14 +88,10 @@ protected:
         return m_panel->SaveUISettings(settings);
     }
 
-    template <typename T> T* Control(int id) const
+    template <typename T> T* Control(const std::string& name) const
     {
-        return wxDynamicCast(m_panel->FindWindow(id), T);
+        return wxDynamicCast(m_panel->FindWindow(ControlId(name)), T);
     }
-    wxRadioButton* Radio(int id) const { return Control<wxRadioButton>(id); }
-    wxComboBox* Combo(int id) const { return Control<wxComboBox>(id); }
-    wxTextCtrl* Text(int id) const { return Control<wxTextCtrl>(id); }
-    bool Enabled(int id) const { return m_panel->FindWindow(id)->IsEnabled(); }
 
     void ClickButton(int id)
     {
@@ -116,6 +100,162 @@ protected:
         m_panel->FindWindow(id)->HandleWindowEvent(event);
     }
 
+    // What a control shows: "1"/"0" for a choice, the text of a field or
+    // list, else its label.
+    std::string Shown(const std::string& name) const
+    {
+        wxWindow* window = m_panel->FindWindow(ControlId(name));
+        if (!window)
+            return "(absent)";
+        if (auto* radio = wxDynamicCast(window, wxRadioButton))
+            return radio->GetValue() ? "1" : "0";
+        if (auto* check = wxDynamicCast(window, wxCheckBox))
+            return check->GetValue() ? "1" : "0";
+        if (auto* text = wxDynamicCast(window, wxTextCtrl))
+            return text->GetValue().ToStdString(wxConvUTF8);
+        if (auto* combo = wxDynamicCast(window, wxComboBox))
+            return combo->GetValue().ToStdString(wxConvUTF8);
+        return window->GetLabel().ToStdString(wxConvUTF8);
+    }
+
+    static std::vector<std::string> List(const std::string& text)
+    {
+        std::vector<std::string> items;
+        for (size_t start = 0, comma = 0; comma != std::string::npos; start = comma + 2)
+            items.push_back(text.substr(start, (comma = text.find(", ", start)) - start));
+        return items;
+    }
+
+    // Runs one step; `arg` is the rest of the step after the first blank.
+    void Step(const std::string& verb, const std::string& arg)
+    {
+        const size_t equals = arg.find('=');
+        const std::string name = arg.substr(0, equals);
+        const std::string value = equals == std::string::npos ? "" : arg.substr(equals + 1);
+        const wxString wxValue = wxString::FromUTF8(value);
+        bool saved = false;
+        if (verb == "load")
+        {
+            for (const std::string& pair : List(arg))
+                if (!pair.empty())
+                    m_settings[pair.substr(0, pair.find('='))] = pair.substr(pair.find('=') + 1);
+            EXPECT_TRUE(m_panel->LoadUISettings(m_settings));
+        }
+        else if (verb == "click")
+            ClickRadio(Control<wxRadioButton>(arg));
+        else if (verb == "toggle")
+            ToggleCheck(Control<wxCheckBox>(arg));
+        else if (verb == "select")
+            SelectComboItem(Control<wxComboBox>(name), wxValue);
+        else if (verb == "type")
+            TypeText(Control<wxTextCtrl>(name), wxValue);
+        else if (verb == "set") // without the event a user's change sends
+        {
+            if (auto* radio = Control<wxRadioButton>(name))
+                radio->SetValue(true);
+            else if (auto* check = Control<wxCheckBox>(name))
+                check->SetValue(value == "1");
+            else if (auto* text = Control<wxTextCtrl>(name))
+                text->ChangeValue(wxValue);
+            else
+                Control<wxComboBox>(name)->SetStringSelection(wxValue);
+        }
+        else if (verb == "custom")
+        {
+            const size_t blank = arg.find(' ');
+            wxTEST_DIALOG(ClickButton(ID_CUSTOMPAGESIZE_BUTTON),
+                          EnterCustomSizeInPoints(arg.substr(0, blank), arg.substr(blank + 1)));
+        }
+        else if (verb == "cancel-custom")
+        {
+            wxTEST_DIALOG(ClickButton(ID_CUSTOMPAGESIZE_BUTTON), CancelCustomSize());
+        }
+        else if (verb == "save")
+            EXPECT_TRUE(Save(m_settings));
+        else if (verb == "refused")
+        {
+            wxTEST_DIALOG(saved = Save(m_settings),
+                          ExpectMessageContaining(wxString::FromUTF8(arg)));
+            EXPECT_FALSE(saved);
+        }
+        else if (verb == "on" || verb == "off")
+            for (const std::string& control : List(arg))
+                EXPECT_EQ(verb == "on", m_panel->FindWindow(ControlId(control))->IsEnabled())
+                    << control;
+        else if (verb == "shows")
+            EXPECT_EQ(value, Shown(name));
+        else if (verb == "label")
+            EXPECT_EQ(wxValue, m_panel->FindWindow(ControlId(name))->GetLabel());
+        else if (verb == "key")
+            for (const std::string& pair : List(arg))
+            {
+                const std::string key = pair.substr(0, pair.find('='));
+                EXPECT_EQ(pair.substr(key.size() + 1), m_settings[key].ToStdString(wxConvUTF8));
+            }
+        else if (verb == "no-comma")
+            for (const auto& entry : m_settings)
+                EXPECT_FALSE(entry.second.Contains(",")) << entry.first;
+        else if (verb == "is-custom")
+            EXPECT_EQ(arg == "1", m_panel->IsCustomPageSize());
+        else if (verb == "saved")
+        {
+            ASSERT_TRUE(Save(m_settings));
+            std::map<std::string, std::string> expected;
+            for (const auto& fields : testkit::ReadCaseTable("ui/panel-defaults.txt"))
+                expected[fields[0]] = fields[1];
+            for (const std::string& pair : List(arg))
+                if (!pair.empty())
+                    expected[pair.substr(0, pair.find('='))] = pair.substr(pair.find('=') + 1);
+            EXPECT_EQ(expected, Sorted(m_settings));
+        }
+        else if (verb == "unit")
+            EXPECT_EQ(std::stoi(arg), m_panel->GetCustomPageUnit());
+        else if (verb == "page-size")
+            EXPECT_EQ(wxString::FromUTF8(arg), m_panel->GetPageSize());
+        else if (verb == "custom-width")
+            EXPECT_DOUBLE_EQ(std::stod(arg), m_panel->GetCustomWidthPoints());
+        else if (verb == "entries")
+            EXPECT_EQ(std::stoul(value), Control<wxComboBox>(name)->GetCount());
+        else if (verb == "separator")
+            EXPECT_EQ(wxString::FromUTF8(arg), m_panel->GetDecimalSeparator());
+        else if (verb == "measure")
+            EXPECT_EQ(wxString::FromUTF8(arg), m_panel->GetMeasurementUnit());
+        else
+            ADD_FAILURE() << "unknown step " << verb;
+    }
+
+    // Runs steps separated by "; "; "\\n" in a step stands for a line break.
+    void RunSteps(const std::string& steps)
+    {
+        for (size_t start = 0, end = 0; end != std::string::npos && !HasFatalFailure();
+             start = end + 2)
+        {
+            std::string step = steps.substr(start, (end = steps.find("; ", start)) - start);
+            for (size_t at; (at = step.find("\\n")) != std::string::npos;)
+                step.replace(at, 2, "\n");
+            SCOPED_TRACE(step);
+            const size_t blank = step.find(' ');
+            Step(step.substr(0, blank), blank == std::string::npos ? "" : step.substr(blank + 1));
+        }
+    }
+
+    // Every scenario of a table: server | steps | what it checks.
+    void RunScenarios(const std::string& table)
+    {
+        const auto scenarios = testkit::ReadCaseTable(table);
+        ASSERT_FALSE(scenarios.empty()) << table;
+        for (const auto& fields : scenarios)
+        {
+            SCOPED_TRACE(fields[2]);
+            if (m_panel)
+                m_panel->Destroy();
+            m_settings.clear();
+            Build(true, fields[0]);
+            RunSteps(fields[1]);
+        }
+    }
+
     ImageSizePanelWithoutMerge* m_panel = nullptr;
+    MapPropToValue m_settings;
 };
 } // namespace ui_test

@@ -1,11 +1,15 @@
-// Panel logic that needs no window: enabling rules, page keys, range checks,
-// separator exchange and the custom size keystroke filter.
+// Panel logic that needs no window, over the cases in
+// tests/data/ui/logic.txt: enabling rules, page keys, range checks,
+// separator exchange, place holders and the custom size keystroke filter.
+#include <functional>
+#include <map>
 #include <memory>
 
 #include <gtest/gtest.h>
 #include <wx/init.h>
 
-#include "ControlIds.h"
+#include "CaseTable.h"
+#include "ControlNames.h"
 #include "EnablingRules.h"
 #include "ImageDimensionRange.h"
 #include "PageSizeKeys.h"
@@ -14,201 +18,164 @@
 
 namespace
 {
-// The translation service finds its catalogues through the application object.
-class ToolkitBase : public ::testing::Environment
-{
-public:
-    void SetUp() override { m_init = std::make_unique<wxInitializer>(); }
-    void TearDown() override { m_init.reset(); }
+using Args = std::vector<wxString>;
 
-private:
-    std::unique_ptr<wxInitializer> m_init;
+// The final state every control was asked for, in the names' order.
+std::string States(const EnableRequests& requests)
+{
+    std::string out;
+    for (const auto& [name, id] : ui_test::ControlNames())
+        if (RequestedState(requests, id) >= 0)
+            out += (out.empty() ? "" : " ") + name + "=" +
+                   std::to_string(RequestedState(requests, id));
+    return out;
+}
+
+template <typename Rule> std::function<std::string(const Args&)> RuleCase(Rule rule)
+{
+    return [rule](const Args& a)
+    {
+        EnableRequests requests;
+        rule(requests, a);
+        return States(requests);
+    };
+}
+
+bool On(const wxString& word)
+{
+    return word == "1";
+}
+double Number(const wxString& text)
+{
+    return std::stod(text.ToStdString());
+}
+
+// Types `typed` key by key into a field holding `start`.
+std::string Typed(const Args& a)
+{
+    SizeKeystrokeResult result;
+    result.text = result.lastAccepted = a[0] == "-" ? "" : a[0];
+    result.insertion = result.text.length();
+    for (wxUniChar ch : a[1])
+    {
+        wxString text = result.text;
+        text.insert(result.insertion, 1, ch);
+        result = FilterSizeKeystroke(text, result.insertion + 1, a[3], Number(a[2]),
+                                     result.lastAccepted);
+    }
+    return result.text.ToStdString() + " @" + std::to_string(result.insertion);
+}
+
+std::vector<stPageAttribute> Sheets()
+{
+    std::vector<stPageAttribute> sheets(3);
+    const char* names[][2] = {{"Letter", "Letter"}, {"A4", "A4 paper"}, {"A4b", "A4 paper"}};
+    for (int i = 0; i < 3; ++i)
+        sheets[i].PaperName = names[i][0], sheets[i].PaperDisplayName = names[i][1];
+    return sheets;
+}
+
+std::string Found(const stPageAttribute* sheet)
+{
+    return sheet ? sheet->PaperName.ToStdString() : "none";
+}
+
+const std::map<std::string, std::function<std::string(const Args&)>> kCases = {
+    {"custom-size", RuleCase([](EnableRequests& r, const Args& a)
+                             { CustomSizeSelectionRule(r, On(a[0]), On(a[1]), On(a[2])); })},
+    {"constrain", RuleCase([](EnableRequests& r, const Args& a)
+                           { ConstrainSelectionRule(r, On(a[0]), On(a[1]), On(a[2]), On(a[3])); })},
+    {"autoscale",
+     RuleCase([](EnableRequests& r, const Args& a) { AutoScaleSelectionRule(r, On(a[0])); })},
+    {"width-height",
+     RuleCase([](EnableRequests& r, const Args& a) { WidthHeightRule(r, On(a[0])); })},
+    {"page-and-image",
+     RuleCase([](EnableRequests& r, const Args& a) { PageAndImageGroupRule(r, On(a[0])); })},
+    {"dimension",
+     [](const Args& a)
+     {
+         const ImageDimensionCheck check = CheckImageDimension(Number(a[0]), a[1]);
+         return check.valid ? std::string("valid")
+                            : "invalid " + check.rangeText.ToStdString() + " reset " +
+                                  check.resetText.ToStdString();
+     }},
+    {"to-storage",
+     [](const Args& a) { return ExchangeDecimalSeparator(a[0], a[1], true).ToStdString(); }},
+    {"to-field",
+     [](const Args& a) { return ExchangeDecimalSeparator(a[0], a[1], false).ToStdString(); }},
+    {"entry-text",
+     [](const Args& a)
+     {
+         return CustomPageEntryText(Number(a[0]), Number(a[1]), a[2] == "mm" ? UNIT_MM : UNIT_INCH)
+             .ToStdString();
+     }},
+    {"type", Typed},
+    {"keystroke",
+     [](const Args& a)
+     {
+         const SizeKeystrokeResult r =
+             FilterSizeKeystroke(a[0], std::stol(a[1].ToStdString()), a[2], Number(a[3]), a[4]);
+         return r.text.ToStdString() + " @" + std::to_string(r.insertion);
+     }},
+    {"parse", [](const Args& a) { return std::to_string(ParseSizeField(a[0], a[1])); }},
+    {"separator-entered", [](const Args& a)
+     { return std::string(IsSeparatorAlreadyEntered(a[0], a[1]) ? "yes" : "no"); }},
+    {"placeholders",
+     [](const Args& a)
+     {
+         wxString message = a[0];
+         ReplacePlaceHolderString(message, wxSplit(a[1], ','), wxSplit(a[2], ','));
+         return message.ToStdString();
+     }},
+    {"sheet-by-display",
+     [](const Args& a) { return Found(FindSheetByDisplayName(Sheets(), a[0])); }},
+    {"sheet-by-name", [](const Args& a) { return Found(FindSheetByPaperName(Sheets(), a[0])); }},
+    {"custom-page-keys",
+     [](const Args& a)
+     {
+         stCustomPageSizeAttribute custom;
+         custom.LeftHWMargin = 5, custom.RightHWMargin = 6;
+         custom.TopHWMargin = 7, custom.BottomHWMargin = 8;
+         custom.command = " pop pop setpagedevice";
+         MapPropToValue settings;
+         WriteCustomPageKeys(settings, Number(a[0]), Number(a[1]), custom,
+                             a[2] == "mm" ? UNIT_MM : UNIT_INCH);
+         std::map<std::string, std::string> sorted;
+         for (const auto& entry : settings)
+             sorted[entry.first.ToStdString()] = entry.second.ToStdString();
+         std::string out;
+         for (const auto& [key, value] : sorted)
+             out += (out.empty() ? "" : ", ") + key + "=" + value;
+         return out;
+     }},
+};
+
+// The translation service finds its catalogues through the application object.
+struct ToolkitBase : ::testing::Environment
+{
+    void SetUp() override { init = std::make_unique<wxInitializer>(); }
+    void TearDown() override { init.reset(); }
+    std::unique_ptr<wxInitializer> init;
 };
 ::testing::Environment* const g_toolkit = ::testing::AddGlobalTestEnvironment(new ToolkitBase);
 } // namespace
 
-TEST(EnablingRules, CustomSizeLeavesOnlyTheDrivingFieldEditable)
+TEST(PanelLogic, CasesAsTabled)
 {
-    EnableRequests requests;
-    CustomSizeSelectionRule(requests, true, true, false);
-    EXPECT_EQ(1, RequestedState(requests, ID_WIDTH_TEXT));
-    EXPECT_EQ(1, RequestedState(requests, ID_WIDTH_UNIT_COMBO));
-    EXPECT_EQ(0, RequestedState(requests, ID_HEIGHT_TEXT));
-    EXPECT_EQ(0, RequestedState(requests, ID_HEIGHT_UNIT_COMBO));
-    EXPECT_EQ(1, RequestedState(requests, ID_CONSTRAIN_CHECK));
-
-    requests.clear();
-    CustomSizeSelectionRule(requests, true, false, true);
-    EXPECT_EQ(0, RequestedState(requests, ID_WIDTH_TEXT));
-    EXPECT_EQ(1, RequestedState(requests, ID_HEIGHT_TEXT));
-
-    requests.clear();
-    CustomSizeSelectionRule(requests, false, true, false);
-    for (int id : {ID_CONSTRAIN_CHECK, ID_WIDTH_RADIO, ID_HEIGHT_RADIO, ID_WIDTH_TEXT,
-                   ID_HEIGHT_TEXT, ID_WIDTH_UNIT_COMBO, ID_HEIGHT_UNIT_COMBO})
-        EXPECT_EQ(0, RequestedState(requests, id)) << id;
-    EXPECT_EQ(-1, RequestedState(requests, ID_FITTOPAGE_RADIO));
-}
-
-TEST(EnablingRules, ConstrainOffFreesBothDimensionsAndHidesTheChoice)
-{
-    EnableRequests requests;
-    ConstrainSelectionRule(requests, false, true, true, false);
-    EXPECT_EQ(1, RequestedState(requests, ID_WIDTH_TEXT));
-    EXPECT_EQ(1, RequestedState(requests, ID_HEIGHT_TEXT));
-    EXPECT_EQ(0, RequestedState(requests, ID_WIDTH_RADIO));
-    EXPECT_EQ(0, RequestedState(requests, ID_HEIGHT_RADIO));
-
-    requests.clear();
-    ConstrainSelectionRule(requests, true, true, true, false);
-    EXPECT_EQ(1, RequestedState(requests, ID_WIDTH_RADIO));
-    EXPECT_EQ(0, RequestedState(requests, ID_HEIGHT_TEXT));
-}
-
-TEST(EnablingRules, OutputTypeSwitchesEveryPageAndImageControl)
-{
-    EnableRequests requests;
-    PageAndImageGroupRule(requests, false);
-    for (int id : std::initializer_list<int>{
-             ID_PAGESIZE_COMBO, ID_CUSTOMPAGESIZE_BUTTON, ID_IMAGEPOSITION_LABEL,
-             ID_IMAGEPOSITION_COMBO, ID_PAGESIZE_LABEL, ID_ORIGINALSIZE_RADIO, ID_CUSTOMSIZE_RADIO,
-             ID_AUTOSCALE_RADIO, ID_SCALETOPRINT_CHECK})
-        EXPECT_EQ(0, RequestedState(requests, id)) << id;
-    EXPECT_EQ(-1, RequestedState(requests, ID_OUTPUT_PS_RADIO));
-}
-
-TEST(PageSizeKeys, CustomSizeIsTruncatedInTheCommandAndKeptInTheBox)
-{
-    stCustomPageSizeAttribute custom;
-    custom.LeftHWMargin = 5;
-    custom.RightHWMargin = 6;
-    custom.TopHWMargin = 7;
-    custom.BottomHWMargin = 8;
-    custom.command = " pop pop setpagedevice";
-    MapPropToValue settings;
-    WriteCustomPageKeys(settings, 595.5, 842.9, custom, UNIT_MM);
-
-    EXPECT_EQ("595.500000", settings["FORCEPAGESIZEX"]);
-    EXPECT_EQ("842.900000", settings["FORCEPAGESIZEY"]);
-    EXPECT_EQ("5", settings["IMAGEEABLESIZELLX"]);
-    EXPECT_EQ("8", settings["IMAGEEABLESIZELLY"]);
-    EXPECT_EQ("589.500000", settings["IMAGEEABLESIZEURX"]);
-    EXPECT_EQ("835.900000", settings["IMAGEEABLESIZEURY"]);
-    EXPECT_EQ("595.500000", settings["CUSTOMPAGEWIDTH"]);
-    EXPECT_EQ("842.900000", settings["CUSTOMPAGEHEIGHT"]);
-    EXPECT_EQ("1", settings["CUSTOMPAGETUNIT"]);
-    EXPECT_EQ("1", settings["CUSTOMPAGESIZE"]);
-    EXPECT_EQ("\n595 842 0 0 1 pop pop setpagedevice", settings["PAGESIZE_COMMAND"]);
-    EXPECT_EQ(11u, settings.size());
-}
-
-TEST(PageSizeKeys, SheetLookupIsCaseSensitiveAndTakesTheFirstMatch)
-{
-    std::vector<stPageAttribute> sheets(3);
-    sheets[0].PaperName = "Letter";
-    sheets[0].PaperDisplayName = "Letter";
-    sheets[1].PaperName = "A4";
-    sheets[1].PaperDisplayName = "A4 paper";
-    sheets[2].PaperName = "A4b";
-    sheets[2].PaperDisplayName = "A4 paper";
-    EXPECT_EQ(&sheets[1], FindSheetByDisplayName(sheets, "A4 paper"));
-    EXPECT_EQ(nullptr, FindSheetByDisplayName(sheets, "a4 paper"));
-    EXPECT_EQ(&sheets[2], FindSheetByPaperName(sheets, "A4b"));
-    EXPECT_EQ(nullptr, FindSheetByPaperName(sheets, "A5"));
-
-    EXPECT_EQ("8.50in x 11.00in", CustomPageEntryText(8.5, 11, UNIT_INCH));
-    EXPECT_EQ("215.90mm x 279.40mm", CustomPageEntryText(215.9, 279.4, UNIT_MM));
-}
-
-TEST(ImageDimensionRange, InchAndMillimetreLimitsAreInclusiveAndNotSymmetric)
-{
-    EXPECT_TRUE(CheckImageDimension(48, "inch").valid);
-    EXPECT_TRUE(CheckImageDimension(0.25, "inch").valid);
-    const ImageDimensionCheck tooWide = CheckImageDimension(48.01, "inch");
-    EXPECT_FALSE(tooWide.valid);
-    EXPECT_EQ("(0.25in - 48in)", tooWide.rangeText);
-    EXPECT_EQ("0.25", tooWide.resetText);
-    EXPECT_FALSE(CheckImageDimension(0.24, "INCH").valid);
-
-    EXPECT_TRUE(CheckImageDimension(5, "mm").valid);
-    EXPECT_TRUE(CheckImageDimension(6, "mm").valid); // below a quarter inch, still accepted
-    EXPECT_TRUE(CheckImageDimension(1220, "mm").valid);
-    const ImageDimensionCheck tooSmall = CheckImageDimension(4.99, "mm");
-    EXPECT_FALSE(tooSmall.valid);
-    EXPECT_EQ("(5mm - 1220mm)", tooSmall.rangeText);
-    EXPECT_EQ("5", tooSmall.resetText);
-
-    EXPECT_TRUE(CheckImageDimension(-3, "point").valid);
-}
-
-TEST(ImageDimensionRange, SeparatorExchangeBothWays)
-{
-    EXPECT_EQ("8.5", ExchangeDecimalSeparator("8,5", ",", true));
-    EXPECT_EQ("8,5", ExchangeDecimalSeparator("8.5", ",", false));
-    EXPECT_EQ("8,5", ExchangeDecimalSeparator("8,5", ".", true));
-    EXPECT_EQ("8.5", ExchangeDecimalSeparator("8.5", ".", false));
-}
-
-TEST(PlaceHolders, ReplacedInOrderOnlyWhenTheListsMatch)
-{
-    wxArrayString placeholders, replacements;
-    placeholders.Add("[A]");
-    placeholders.Add("[B]");
-    replacements.Add("1");
-    wxString message = "[A] and [B] and [A]";
-    ReplacePlaceHolderString(message, placeholders, replacements);
-    EXPECT_EQ("[A] and [B] and [A]", message);
-
-    replacements.Add("2");
-    ReplacePlaceHolderString(message, placeholders, replacements);
-    EXPECT_EQ("1 and 2 and [A]", message);
-}
-
-namespace
-{
-// Types `text` character by character, as the field sees it.
-SizeKeystrokeResult TypeInto(wxString field, const wxString& typed, double maximum,
-                             const wxString& point = ".")
-{
-    SizeKeystrokeResult result;
-    result.text = field;
-    result.insertion = field.length();
-    result.lastAccepted = field;
-    for (wxUniChar ch : typed)
+    const auto cases = testkit::ReadCaseTable("ui/logic.txt");
+    ASSERT_GT(cases.size(), 40u);
+    for (const auto& c : cases)
     {
-        wxString text = result.text;
-        text.insert(result.insertion, 1, ch);
-        result =
-            FilterSizeKeystroke(text, result.insertion + 1, point, maximum, result.lastAccepted);
+        ASSERT_EQ(c.size(), 4u) << c[0];
+        SCOPED_TRACE(c[0] + " | " + c[1] + " | " + c[3]);
+        ASSERT_EQ(kCases.count(c[0]), 1u);
+        Args args;
+        for (size_t start = 0, slash = 0; slash != std::string::npos; start = slash + 3)
+            args.push_back(
+                wxString::FromUTF8(c[1].substr(start, (slash = c[1].find(" / ", start)) - start)));
+        std::string expected = c[2];
+        for (size_t at; (at = expected.find("\\n")) != std::string::npos;)
+            expected.replace(at, 2, "\n");
+        EXPECT_EQ(expected, kCases.at(c[0])(args));
     }
-    return result;
-}
-} // namespace
-
-TEST(SizeKeystrokeFilter, ValueAboveTheMaximumRevertsToTheLastAcceptedText)
-{
-    const SizeKeystrokeResult result = TypeInto("", "1001", 1000);
-    EXPECT_EQ("100", result.text);
-    EXPECT_EQ(3, result.insertion);
-    EXPECT_EQ("1000", TypeInto("", "1000", 1000).text);
-}
-
-TEST(SizeKeystrokeFilter, LettersSecondSeparatorAndThirdDecimalAreUndone)
-{
-    EXPECT_EQ("12", TypeInto("", "1a2", 1000).text);
-    EXPECT_EQ("1.5", TypeInto("", "1.5.", 1000).text);
-    EXPECT_EQ("1.25", TypeInto("", "1.257", 1000).text);
-    EXPECT_EQ("1,25", TypeInto("", "1,257", 1000, ",").text);
-    EXPECT_EQ("15", TypeInto("", "1.5", 1000, ",").text); // "." is not this locale's point
-    EXPECT_EQ("8", TypeInto("", "-8e", 1000).text);
-}
-
-TEST(SizeKeystrokeFilter, EditInTheMiddleRemovesTheTypedCharacterOnly)
-{
-    const SizeKeystrokeResult result = FilterSizeKeystroke("1x23", 2, ".", 1000, "123");
-    EXPECT_EQ("123", result.text);
-    EXPECT_EQ(1, result.insertion);
-    EXPECT_DOUBLE_EQ(12.5, ParseSizeField("12,5", ","));
-    EXPECT_TRUE(IsSeparatorAlreadyEntered("1,2,", ","));
-    EXPECT_FALSE(IsSeparatorAlreadyEntered("1,2", ","));
 }
