@@ -2,6 +2,8 @@
 // A settings panel built by the factory from a test server description, and
 // a driver for the panel scenarios of the case tables under tests/data/ui:
 // one scenario a line, its steps separated by "; " (see panel-scenarios.txt).
+#include <sstream>
+
 #include <wx/button.h>
 #include <wx/checkbox.h>
 #include <wx/combobox.h>
@@ -11,6 +13,7 @@
 #include <wx/testing.h>
 #include <wx/textctrl.h>
 
+#include "ControlIds.h"
 #include "ControlNames.h"
 #include "CustomPageSizeDlg.h"
 #include "GuiTestSupport.h"
@@ -71,7 +74,7 @@ private:
 class PanelTest : public GuiTest
 {
 protected:
-    ImageSizePanelWithoutMerge* Build(bool enabled = true, const wxString& server = "ui")
+    ImageSizePanelWithoutMerge* Build(bool enabled = true, const std::string& server = "ui")
     {
         const wxString xml = TestDataText("ui/server-" + server + ".xml");
         m_panel = wxDynamicCast(ImageSizePanelWithoutMerge_Factory::CreateInstance(
@@ -90,21 +93,21 @@ protected:
 
     template <typename T> T* Control(const std::string& name) const
     {
-        return wxDynamicCast(m_panel->FindWindow(ControlId(name)), T);
+        return wxDynamicCast(Root()->FindWindow(ControlId(name)), T);
     }
 
     void ClickButton(int id)
     {
         wxCommandEvent event(wxEVT_BUTTON, id);
-        event.SetEventObject(m_panel->FindWindow(id));
-        m_panel->FindWindow(id)->HandleWindowEvent(event);
+        event.SetEventObject(Root()->FindWindow(id));
+        Root()->FindWindow(id)->HandleWindowEvent(event);
     }
 
     // What a control shows: "1"/"0" for a choice, the text of a field or
     // list, else its label.
     std::string Shown(const std::string& name) const
     {
-        wxWindow* window = m_panel->FindWindow(ControlId(name));
+        wxWindow* window = Root()->FindWindow(ControlId(name));
         if (!window)
             return "(absent)";
         if (auto* radio = wxDynamicCast(window, wxRadioButton))
@@ -180,12 +183,12 @@ protected:
         }
         else if (verb == "on" || verb == "off")
             for (const std::string& control : List(arg))
-                EXPECT_EQ(verb == "on", m_panel->FindWindow(ControlId(control))->IsEnabled())
+                EXPECT_EQ(verb == "on", Root()->FindWindow(ControlId(control))->IsEnabled())
                     << control;
         else if (verb == "shows")
             EXPECT_EQ(value, Shown(name));
         else if (verb == "label")
-            EXPECT_EQ(wxValue, m_panel->FindWindow(ControlId(name))->GetLabel());
+            EXPECT_EQ(wxValue, Root()->FindWindow(ControlId(name))->GetLabel());
         else if (verb == "key")
             for (const std::string& pair : List(arg))
             {
@@ -220,6 +223,41 @@ protected:
             EXPECT_EQ(wxString::FromUTF8(arg), m_panel->GetDecimalSeparator());
         else if (verb == "measure")
             EXPECT_EQ(wxString::FromUTF8(arg), m_panel->GetMeasurementUnit());
+        else if (verb == "dialog") // limits and size in points, shown in a unit
+        {
+            std::istringstream in(arg);
+            double v[6];
+            std::string unit, length;
+            in >> v[0] >> v[1] >> v[2] >> v[3] >> v[4] >> v[5] >> unit >> length;
+            const Unit_t shown = unit == "inch" ? UNIT_INCH : unit == "mm" ? UNIT_MM : UNIT_POINT;
+            for (double& value : v)
+                convertToUnit(value, UNIT_POINT, shown);
+            m_heightIsLength = length == "length";
+            CloseDialog();
+            m_dialog = new CustomPageSizeDlg(m_frame, wxID_ANY, "Custom page size", v[0], v[1],
+                                             v[2], v[3], v[4], v[5], shown, m_heightIsLength);
+        }
+        else if (verb == "accept") // "yes", or "warned yes"/"warned no" after a message
+        {
+            bool accepted = false;
+            if (arg.rfind("warned", 0) == 0)
+            {
+                wxTEST_DIALOG(accepted = m_dialog->AcceptSizes(),
+                              wxExpectModal<wxMessageDialog>(wxID_OK));
+            }
+            else
+                accepted = m_dialog->AcceptSizes();
+            EXPECT_EQ(arg.substr(arg.size() - 3) == "yes", accepted);
+        }
+        else if (verb == "sizes") // width height unit (0 inch, 1 mm, 2 point)
+        {
+            double width = 0, height = 0;
+            Unit_t unit = UNIT_INCH;
+            m_dialog->GetPageSizes(width, height, unit);
+            std::ostringstream text;
+            text << width << " " << height << " " << unit;
+            EXPECT_EQ(arg, text.str());
+        }
         else
             ADD_FAILURE() << "unknown step " << verb;
     }
@@ -247,15 +285,34 @@ protected:
         for (const auto& fields : scenarios)
         {
             SCOPED_TRACE(fields[2]);
+            CloseDialog();
             if (m_panel)
                 m_panel->Destroy();
+            m_panel = nullptr;
             m_settings.clear();
-            Build(true, fields[0]);
+            if (fields[0] != "-")
+                Build(true, fields[0]);
             RunSteps(fields[1]);
         }
     }
 
+    void TearDown() override
+    {
+        CloseDialog();
+        GuiTest::TearDown();
+    }
+    void CloseDialog()
+    {
+        if (m_dialog)
+            m_dialog->Destroy();
+        m_dialog = nullptr;
+    }
+    // The window whose controls the steps address: the open dialog, else the panel.
+    wxWindow* Root() const { return m_dialog ? static_cast<wxWindow*>(m_dialog) : m_panel; }
+
     ImageSizePanelWithoutMerge* m_panel = nullptr;
+    CustomPageSizeDlg* m_dialog = nullptr;
+    bool m_heightIsLength = false;
     MapPropToValue m_settings;
 };
 } // namespace ui_test
