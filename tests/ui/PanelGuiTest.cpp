@@ -1,16 +1,29 @@
 // The EPS settings panel driven like a user would, over the scenarios of
 // tests/data/ui/panel-scenarios.txt; then what a table cannot say: the
-// sections' look, the disabled panel and the keyboard order.
+// sections' look, the disabled panel and the keyboard order. The custom page
+// size dialog over tests/data/ui/custom-dialog.txt, under a decimal-comma
+// locale and with keys typed for real. And from the panel to the printed
+// page: the user picks a custom page, a corner and an image width, the host
+// saves, a filter set up from that preference converts, and Ghostscript
+// shows the artwork where the user asked.
 #include <wx/sizer.h>
 #include <wx/statbox.h>
+#include <wx/timer.h>
 #include <wx/uiaction.h>
+#include <wx/xml/xml.h>
 
 #include <hotfolder/Themer.h>
 
+#include "EPS.h"
+#include "EPStoPS.h"
+#include "GhostscriptOracle.h"
 #include "PanelTestFixture.h"
+#include "SampleEps.h"
 
 using namespace ui_test;
 using SettingsPanel = PanelTest;
+using CustomDialog = PanelTest;
+using PanelConversion = PanelTest;
 
 TEST_F(SettingsPanel, ScenariosAsTabled)
 {
@@ -80,4 +93,110 @@ TEST_F(SettingsPanel, TabOrderFollowsTheLayout)
     ASSERT_NE(nullptr, focus);
     EXPECT_TRUE(focus == Control<wxWindow>("width-unit") ||
                 focus->GetParent() == Control<wxWindow>("width-unit"));
+}
+
+TEST_F(CustomDialog, CasesAsTabled)
+{
+    RunScenarios("ui/custom-dialog.txt");
+}
+
+TEST_F(CustomDialog, FieldsUseTheLocalesDecimalPoint)
+{
+    TESTKIT_USE_LOCALE(german, "de_DE.UTF-8");
+    RunSteps("dialog 72 1000 72 1400 612 792 point; shows custom-width=612,00; "
+             "type custom-width=500,5; accept yes; sizes 500.5 792 2");
+}
+
+TEST_F(CustomDialog, TypedKeysAboveTheMaximumOrNotNumbersAreUndone)
+{
+    RunSteps("dialog 72 1000 72 1400 612 792 point");
+    m_dialog->Show();
+    auto* width = wxDynamicCast(Root()->FindWindow(ControlId("custom-width")), wxTextCtrl);
+    if (!FocusFor(width))
+        GTEST_SKIP() << "the display gives no keyboard focus";
+    for (const auto& [keys, shown] : {std::pair<std::string, std::string>{"1001", "100"},
+                                      std::pair<std::string, std::string>{"7x2.255", "72.25"}})
+    {
+        width->Clear();
+        // Waits until the field has seen every key come back up.
+        size_t released = 0;
+        auto count = [&released](wxKeyEvent& event) { ++released, event.Skip(); };
+        width->Bind(wxEVT_KEY_UP, count);
+        wxUIActionSimulator().Text(keys.c_str());
+        for (int i = 0; i < 400 && released < keys.size(); ++i)
+            Pump(25);
+        width->Unbind(wxEVT_KEY_UP, count);
+        ASSERT_GE(released, keys.size()) << "keys lost on the display";
+        EXPECT_EQ(shown, width->GetValue());
+    }
+}
+
+TEST_F(CustomDialog, EnterAnswersOkAndEscapeCancels)
+{
+    for (const auto& [key, expected] :
+         {std::pair<int, int>{WXK_RETURN, wxID_OK}, std::pair<int, int>{WXK_ESCAPE, wxID_CANCEL}})
+    {
+        RunSteps("dialog 72 1000 72 1400 612 792 point");
+        // A real modal loop; a timer ends it if the key never arrives.
+        g_realModalAllowed = true;
+        wxTimer guard;
+        guard.Bind(wxEVT_TIMER, [this](wxTimerEvent&) { m_dialog->EndModal(wxID_ABORT); });
+        m_dialog->CallAfter(
+            [this, key = key]()
+            {
+                FocusFor(Root()->FindWindow(ControlId("custom-width")));
+                wxUIActionSimulator().Char(key);
+            });
+        guard.StartOnce(5000);
+        const int result = m_dialog->ShowModal();
+        guard.Stop();
+        g_realModalAllowed = false;
+        if (result == wxID_ABORT)
+            GTEST_SKIP() << "the display delivered no keystroke";
+        EXPECT_EQ(expected, result);
+    }
+}
+
+TEST_F(PanelConversion, SavedChoicesPlaceAndSizeTheArtwork)
+{
+    if (!testkit::ProgramAvailable("gs"))
+        GTEST_SKIP() << "Ghostscript is not installed";
+
+    EPS filter("EPS");
+    ASSERT_EQ(0, filter.Initialize(TestDataText("ui/server-ui.xml")));
+    ASSERT_TRUE(filter.IsFilterEnabled());
+    m_panel = wxDynamicCast(filter.ShowPluginUI(m_frame), ImageSizePanelWithoutMerge);
+    ASSERT_NE(nullptr, m_panel);
+    EXPECT_EQ("0", filter.GetSettings()["CUSTOMPAGETUNIT"]); // the server prefers inches
+    RunSteps("click ps; custom 500 700; select position=Bottom Left; click custom; type width=2");
+
+    wxXmlNode host(wxXML_ELEMENT_NODE, "Filter");
+    ASSERT_EQ(0, filter.SavePreference(&host));
+    ASSERT_NE(nullptr, host.GetChildren());
+    EXPECT_EQ("UI", host.GetChildren()->GetName());
+
+    // The folder's jobs run on a filter set up from the saved preference;
+    // the page command is fixed at an object's first parameter load.
+    EPS processing("EPS");
+    ASSERT_EQ(0, processing.Initialize(TestDataText("ui/server-ui.xml")));
+    ASSERT_EQ(0, processing.InitilaizeFromPreference(&host));
+
+    const testkit::ScratchDir folder;
+    const std::string input = folder.File("art.eps"), output = folder.File("art.ps");
+    ASSERT_TRUE(testkit::WriteFile(input, sample::RectangleEps(0, 0, 100, 50)));
+    void* context = nullptr;
+    ASSERT_EQ(1u, IsThisEPS(input.c_str(), &context));
+    ASSERT_EQ(1, ConvertEPStoPS(&context, &processing.GetParams(), output.c_str()));
+
+    const hf_test::GhostscriptReport report = hf_test::RunGhostscriptBBox(output);
+    ASSERT_FALSE(report.postscriptError) << report.process.err;
+    ASSERT_TRUE(report.marked);
+    EXPECT_NEAR(500, report.pageWidth, 0.5);
+    EXPECT_NEAR(700, report.pageHeight, 0.5);
+    // 2 inches wide, proportions kept, in the bottom left corner of the
+    // area inside the server's hardware margins (left 5, bottom 8).
+    EXPECT_NEAR(5, report.marks.llx, 1.5);
+    EXPECT_NEAR(8, report.marks.lly, 1.5);
+    EXPECT_NEAR(5 + 144, report.marks.urx, 1.5);
+    EXPECT_NEAR(8 + 72, report.marks.ury, 1.5);
 }

@@ -2,6 +2,8 @@
 // A settings panel built by the factory from a test server description, and
 // a driver for the panel scenarios of the case tables under tests/data/ui:
 // one scenario a line, its steps separated by "; " (see panel-scenarios.txt).
+#include <algorithm>
+#include <functional>
 #include <sstream>
 
 #include <wx/button.h>
@@ -22,53 +24,17 @@
 
 namespace ui_test
 {
-// Answers the custom page size dialog: switches it to points, types the
-// size in the field's notation and presses OK (with OK's own checks).
-class EnterCustomSizeInPoints : public wxExpectModalBase<CustomPageSizeDlg>
+// Answers a modal dialog of type Dialog with what `answer` returns.
+template <typename Dialog> class Answer : public wxExpectModalBase<Dialog>
 {
 public:
-    EnterCustomSizeInPoints(wxString width, wxString height) : m_width(width), m_height(height) {}
+    explicit Answer(std::function<int(Dialog*)> answer) : m_answer(std::move(answer)) {}
 
 protected:
-    int OnInvoked(CustomPageSizeDlg* dialog) const override
-    {
-        ClickRadio(wxDynamicCast(dialog->FindWindow(ID_CUSTOM_UNIT_POINT), wxRadioButton));
-        auto* width = wxDynamicCast(dialog->FindWindow(ID_CUSTOM_WIDTH_TEXT), wxTextCtrl);
-        auto* height = wxDynamicCast(dialog->FindWindow(ID_CUSTOM_HEIGHT_TEXT), wxTextCtrl);
-        const wxString point = width->GetValue().Right(3).Left(1); // shown as "612.00"
-        wxString w = m_width, h = m_height;
-        w.Replace(".", point);
-        h.Replace(".", point);
-        TypeText(width, w);
-        TypeText(height, h);
-        return dialog->AcceptSizes() ? wxID_OK : wxID_CANCEL;
-    }
+    int OnInvoked(Dialog* dialog) const override { return m_answer(dialog); }
 
 private:
-    wxString m_width, m_height;
-};
-
-class CancelCustomSize : public wxExpectModalBase<CustomPageSizeDlg>
-{
-protected:
-    int OnInvoked(CustomPageSizeDlg*) const override { return wxID_CANCEL; }
-};
-
-// A message box whose text must contain `part`.
-class ExpectMessageContaining : public wxExpectModalBase<wxMessageDialog>
-{
-public:
-    explicit ExpectMessageContaining(wxString part) : m_part(std::move(part)) {}
-
-protected:
-    int OnInvoked(wxMessageDialog* dialog) const override
-    {
-        EXPECT_NE(wxNOT_FOUND, dialog->GetMessage().Find(m_part)) << dialog->GetMessage();
-        return wxID_OK;
-    }
-
-private:
-    wxString m_part;
+    std::function<int(Dialog*)> m_answer;
 };
 
 class PanelTest : public GuiTest
@@ -163,22 +129,34 @@ protected:
             else
                 Control<wxComboBox>(name)->SetStringSelection(wxValue);
         }
-        else if (verb == "custom")
+        else if (verb == "custom" || verb == "cancel-custom") // sizes typed in points
         {
-            const size_t blank = arg.find(' ');
-            wxTEST_DIALOG(ClickButton(ID_CUSTOMPAGESIZE_BUTTON),
-                          EnterCustomSizeInPoints(arg.substr(0, blank), arg.substr(blank + 1)));
-        }
-        else if (verb == "cancel-custom")
-        {
-            wxTEST_DIALOG(ClickButton(ID_CUSTOMPAGESIZE_BUTTON), CancelCustomSize());
+            auto answer = [&](CustomPageSizeDlg* dialog)
+            {
+                if (verb == "cancel-custom")
+                    return int(wxID_CANCEL);
+                m_dialog = dialog;
+                RunSteps("click custom-point"); // now shown as "612.00"
+                std::string sizes = arg;        // typed in the field's notation
+                std::replace(sizes.begin(), sizes.end(), '.', Shown("custom-width").at(3));
+                const size_t blank = sizes.find(' ');
+                RunSteps("type custom-width=" + sizes.substr(0, blank) +
+                         "; type custom-height=" + sizes.substr(blank + 1));
+                m_dialog = nullptr;
+                return dialog->AcceptSizes() ? int(wxID_OK) : int(wxID_CANCEL);
+            };
+            wxTEST_DIALOG(ClickButton(ID_CUSTOMPAGESIZE_BUTTON), Answer<CustomPageSizeDlg>(answer));
         }
         else if (verb == "save")
             EXPECT_TRUE(Save(m_settings));
         else if (verb == "refused")
         {
-            wxTEST_DIALOG(saved = Save(m_settings),
-                          ExpectMessageContaining(wxString::FromUTF8(arg)));
+            auto answer = [&](wxMessageDialog* box)
+            {
+                EXPECT_NE(wxNOT_FOUND, box->GetMessage().Find(wxString::FromUTF8(arg)));
+                return int(wxID_OK);
+            };
+            wxTEST_DIALOG(saved = Save(m_settings), Answer<wxMessageDialog>(answer));
             EXPECT_FALSE(saved);
         }
         else if (verb == "on" || verb == "off")
@@ -219,10 +197,6 @@ protected:
             EXPECT_DOUBLE_EQ(std::stod(arg), m_panel->GetCustomWidthPoints());
         else if (verb == "entries")
             EXPECT_EQ(std::stoul(value), Control<wxComboBox>(name)->GetCount());
-        else if (verb == "separator")
-            EXPECT_EQ(wxString::FromUTF8(arg), m_panel->GetDecimalSeparator());
-        else if (verb == "measure")
-            EXPECT_EQ(wxString::FromUTF8(arg), m_panel->GetMeasurementUnit());
         else if (verb == "dialog") // limits and size in points, shown in a unit
         {
             std::istringstream in(arg);
