@@ -1,6 +1,6 @@
 // The EPS settings panel driven like a user would, over the scenarios of
 // tests/data/ui/panel-scenarios.txt; then what a table cannot say: the
-// sections' look, the disabled panel and the keyboard order. The custom page
+// sections' look and the keyboard order. The custom page
 // size dialog over tests/data/ui/custom-dialog.txt, under a decimal-comma
 // locale and with keys typed for real. And from the panel to the printed
 // page: the user picks a custom page, a corner and an image width, the host
@@ -53,20 +53,6 @@ TEST_F(SettingsPanel, HeaderStripAndSectionsLook)
     EXPECT_EQ(input->GetPosition(), wxPoint(5, 22 + 5));
     const wxRect eps = Control("eps")->GetRect();
     EXPECT_EQ(Control("ps")->GetPosition().x - eps.GetRight() - 1, 10);
-}
-
-TEST_F(SettingsPanel, DisabledFilterShowsHeaderAndInputTypeOnlyAndTouchesNoKey)
-{
-    Build(false);
-    for (const char* name : {"original", "page", "eps"})
-        EXPECT_EQ("(absent)", Shown(name));
-    EXPECT_EQ(".eps", Shown("input"));
-    EXPECT_EQ(4u, m_panel->GetChildren().size()); // header strip, box, label and text
-    m_settings["OUTPUTFILETYPEEPS"] = "0";
-    EXPECT_TRUE(m_panel->LoadUISettings(m_settings));
-    EXPECT_TRUE(Save(m_settings));
-    EXPECT_EQ(1u, m_settings.size());
-    EXPECT_EQ("0", m_settings["OUTPUTFILETYPEEPS"]);
 }
 
 TEST_F(SettingsPanel, TabOrderFollowsTheLayout)

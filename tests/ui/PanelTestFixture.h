@@ -275,18 +275,21 @@ protected:
         else if (verb == "no-comma")
             for (const auto& entry : m_settings)
                 EXPECT_FALSE(entry.second.Contains(",")) << entry.first;
-        else if (verb == "saved") // the whole map: the defaults with these changes
+        else if (verb == "saved" || verb == "exactly") // the whole map (saved: defaults changed)
         {
-            ASSERT_TRUE(Save(m_settings));
             std::map<std::string, std::string> expected, saved;
-            for (const auto& fields : testkit::ReadCaseTable("ui/panel-defaults.txt"))
-                expected[fields[0]] = fields[1];
+            if (verb == "saved")
+                for (const auto& fields : testkit::ReadCaseTable("ui/panel-defaults.txt"))
+                    expected[fields[0]] = fields[1];
+            ASSERT_TRUE(verb == "exactly" || Save(m_settings));
             for (const auto& [key, stored] : Pairs(arg))
                 expected[key] = stored;
             for (const auto& entry : m_settings)
                 saved[entry.first.utf8_string()] = entry.second.utf8_string();
             EXPECT_EQ(expected, saved);
         }
+        else if (verb == "children")
+            EXPECT_EQ(std::stoul(arg), m_panel->GetChildren().size());
         else if (verb == "is-custom")
             EXPECT_EQ(arg == "1", m_panel->IsCustomPageSize());
         else if (verb == "unit")
@@ -350,7 +353,8 @@ protected:
         }
     }
 
-    // Every scenario of a table: server ("-" for none) | steps | what it checks.
+    // Every scenario of a table: server ("-" for no panel, "disabled" for the
+    // panel of a filter the server does not enable) | steps | what it checks.
     void RunScenarios(const std::string& table)
     {
         const auto scenarios = testkit::ReadCaseTable(table);
@@ -364,7 +368,7 @@ protected:
             m_panel = nullptr;
             m_settings.clear();
             if (fields[0] != "-")
-                Build(true, fields[0]);
+                Build(fields[0] != "disabled", fields[0] == "disabled" ? "ui" : fields[0]);
             RunSteps(fields[1]);
         }
     }
