@@ -1,7 +1,5 @@
-// Hosts and modules are built apart: the slot of every virtual function of
-// the interface must stay where hosts expect it. And the default host
-// services: catalogues compiled from the repository's .po files and found
-// beside the library, and the theme service.
+// Hosts and modules are built apart: interface slots and record order stay
+// where hosts expect them. And the default host services (catalogues, theme).
 #include <cstring>
 #include <iterator>
 
@@ -11,22 +9,14 @@
 #include <hotfolder/Themer.h>
 #include <wx/translation.h>
 
-namespace
+// Under the Itanium C++ ABI a pointer to a virtual member function starts
+// with 1 + the byte offset of its slot in the vtable.
+template <typename F> static long SlotOf(F function)
 {
-// Under the Itanium C++ ABI a pointer to a virtual member function holds
-// 1 + the byte offset of its slot in the vtable.
-template <typename F> long SlotOf(F function)
-{
-    struct Representation
-    {
-        uintptr_t ptr;
-        ptrdiff_t adj;
-    } rep;
-    static_assert(sizeof(F) == sizeof(Representation));
-    std::memcpy(&rep, &function, sizeof rep);
-    return static_cast<long>((rep.ptr - 1) / sizeof(void*));
+    uintptr_t first;
+    std::memcpy(&first, &function, sizeof first);
+    return static_cast<long>((first - 1) / sizeof(void*));
 }
-} // namespace
 
 TEST(InterfaceLayout, SlotsInHostOrder)
 {
@@ -55,67 +45,57 @@ TEST(InterfaceLayout, SlotsInHostOrder)
 
 TEST(InterfaceLayout, DescriptionRecordOrder)
 {
-    // Offsets measured on an object: the record holds wx members, so it is
-    // not standard layout and offsetof is not portable on it.
+    // Offsets measured on an object: the record holds toolkit members, so it
+    // is not standard layout and offsetof is not portable on it.
     const PluginInfo info;
-    auto at = [&info](const void* member)
-    { return static_cast<const char*>(member) - reinterpret_cast<const char*>(&info); };
-    EXPECT_EQ(at(&info.m_llKind), 0);
-    EXPECT_LT(at(&info.m_strVersion), at(&info.m_strIdentifier));
-    EXPECT_LT(at(&info.m_strIdentifier), at(&info.m_strDisplayName));
-    EXPECT_LT(at(&info.m_strDisplayName), at(&info.m_arrExtensions));
-    EXPECT_LT(at(&info.m_arrExtensions), at(&info.m_strHostReserved));
-    EXPECT_EQ(at(&info.m_arrRequiredServerFeatures) - at(&info.m_strHostReserved),
-              static_cast<ptrdiff_t>(sizeof(wxString)));
+#define AT(member)                                                                                 \
+    (reinterpret_cast<const char*>(&info.member) - reinterpret_cast<const char*>(&info))
+    EXPECT_EQ(AT(m_llKind), 0);
+    EXPECT_LT(AT(m_strVersion), AT(m_strIdentifier));
+    EXPECT_LT(AT(m_strIdentifier), AT(m_strDisplayName));
+    EXPECT_LT(AT(m_strDisplayName), AT(m_arrExtensions));
+    EXPECT_LT(AT(m_arrExtensions), AT(m_strHostReserved));
+    EXPECT_EQ(AT(m_arrRequiredServerFeatures) - AT(m_strHostReserved), ptrdiff_t(sizeof(wxString)));
+#undef AT
 }
 
-TEST(JobCollection, OwnsCopiesInOrder)
+TEST(JobCollection, HoldsCopies)
 {
     ReadyToProcessJobInfo job;
     EXPECT_EQ(job.auxValue, 0u); // a new job carries no value
-    job.jobName = "a.eps";
+    job.filterId = "Orv.EPS.1", job.jobName = "a.eps", job.auxText = "aux", job.auxValue = 7;
     job.files.Add("/in/a.eps");
-    job.auxValue = 7;
     JobInfoCollection jobs;
-    jobs.Add(job, 2);
-    job.jobName = "b.eps";
     jobs.Add(job);
-    ASSERT_EQ(jobs.GetCount(), 3u);
-    EXPECT_EQ(jobs[0].jobName + jobs[1].jobName + jobs[2].jobName, "a.epsa.epsb.eps");
-    EXPECT_NE(&jobs[0], &jobs[1]);
-    EXPECT_EQ(jobs[1].files[0], "/in/a.eps");
-    EXPECT_EQ(jobs[1].auxValue, 7u);
+    EXPECT_EQ(jobs[0].filterId + jobs[0].jobName + jobs[0].files[0] + jobs[0].auxText,
+              "Orv.EPS.1a.eps/in/a.epsaux");
+    EXPECT_EQ(jobs[0].auxValue, 7u);
 }
 
-TEST(Translations, CataloguesBesideTheLibrary)
+TEST(HostServices, CataloguesBesideTheLibraryAndTheHeaderTheme)
 {
     HFTranslations* service = HFTranslations::GetInstance();
     ASSERT_EQ(service, HFTranslations::GetInstance());
     const wxArrayString languages = service->AvailableLanguages();
-    EXPECT_NE(languages.Index("de"), wxNOT_FOUND) << service->CatalogDirectory();
-    EXPECT_NE(languages.Index("fr"), wxNOT_FOUND);
+    EXPECT_TRUE(languages.Index("de") >= 0 && languages.Index("fr") >= 0)
+        << service->CatalogDirectory();
     // Every language's word, English first; a word no catalogue knows is only itself.
     const wxArrayString inch = service->GetTranslations("inch");
     EXPECT_TRUE(inch[0] == "inch" && inch.Index("Zoll") > 0 && inch.Index("pouce") > 0);
     EXPECT_EQ(service->GetTranslations("no such word"), wxArrayString(1, "no such word"));
-
     // The selected language reaches the toolkit's own lookups.
     ASSERT_TRUE(service->SelectLanguage("de"));
-    EXPECT_EQ(service->Translate("Top Left"), "Oben links");
-    EXPECT_EQ(wxGetTranslation("Invalid input file"), wxString::FromUTF8("Ungültige Eingabedatei"));
-    EXPECT_EQ(service->Translate("not in the catalogue"), "not in the catalogue");
+    EXPECT_EQ(service->Translate("Top Left") + "|" + wxGetTranslation("Invalid input file") + "|" +
+                  service->Translate("not in the catalogue"),
+              wxString::FromUTF8("Oben links|Ungültige Eingabedatei|not in the catalogue"));
     EXPECT_FALSE(service->SelectLanguage("xx"));
-    EXPECT_EQ(service->GetSelectedLanguage(), "");
-    EXPECT_EQ(service->Translate("Top Left"), "Top Left");
-    EXPECT_EQ(wxGetTranslation("Invalid input file"), "Invalid input file");
+    EXPECT_EQ(service->GetSelectedLanguage() + "|" + service->Translate("Top Left") + "|" +
+                  wxGetTranslation("Invalid input file"),
+              "|Top Left|Invalid input file");
     EXPECT_TRUE(service->SelectLanguage("en"));
-}
-
-TEST(Theme, HeaderStripIsDarkWithBoldWhiteText)
-{
+    // The header strip above filter panels: dark, with bold white text.
     const stTheme header = Themer::GetThemeService()->GetTheme("HeaderView");
     EXPECT_EQ(header.m_background, wxColour(0x3b, 0x4a, 0x5a));
-    EXPECT_EQ(header.m_foreground, *wxWHITE);
-    EXPECT_EQ(header.m_font.GetPointSize(), 11);
-    EXPECT_EQ(header.m_font.GetWeight(), wxFONTWEIGHT_BOLD);
+    EXPECT_TRUE(header.m_foreground == *wxWHITE && header.m_font.GetPointSize() == 11 &&
+                header.m_font.GetWeight() == wxFONTWEIGHT_BOLD);
 }
