@@ -99,8 +99,10 @@ protected:
     {
         CloseDialog();
         if (m_frame)
+        {
             m_frame->Destroy();
-        Pump(10);
+            Pump(10);
+        }
     }
     void CloseDialog()
     {
@@ -109,14 +111,13 @@ protected:
         m_dialog = nullptr;
     }
 
-    ImageSizePanelWithoutMerge* Build(bool enabled = true, const std::string& server = "ui")
+    void Build(bool enabled = true, const std::string& server = "ui")
     {
         const wxString xml = TestDataText("ui/server-" + server + ".xml");
         m_panel = wxDynamicCast(ImageSizePanelWithoutMerge_Factory::CreateInstance(
                                     m_frame, xml, "EPS", ".eps", enabled, enabled),
                                 ImageSizePanelWithoutMerge);
         m_frame->Layout();
-        return m_panel;
     }
 
     // What the host does on OK.
