@@ -1,87 +1,101 @@
-// Hosts and modules are built apart: the slot of every virtual function of
-// the interface must stay where hosts expect it.
+// Hosts and modules are built apart: interface slots and record order stay
+// where hosts expect them. And the default host services (catalogues, theme).
 #include <cstring>
+#include <iterator>
 
 #include <gtest/gtest.h>
 #include <hotfolder/HFPlugin.h>
+#include <hotfolder/HFTranslations.h>
+#include <hotfolder/Themer.h>
+#include <wx/translation.h>
 
-namespace
+// Under the Itanium C++ ABI a pointer to a virtual member function starts
+// with 1 + the byte offset of its slot in the vtable.
+template <typename F> static long SlotOf(F function)
 {
-// Under the Itanium C++ ABI a pointer to a virtual member function holds
-// 1 + the byte offset of its slot in the vtable.
-template <typename F> long SlotOf(F function)
-{
-    struct Representation
-    {
-        uintptr_t ptr;
-        ptrdiff_t adj;
-    } rep;
-    static_assert(sizeof(F) == sizeof(Representation));
-    std::memcpy(&rep, &function, sizeof rep);
-    return static_cast<long>((rep.ptr - 1) / sizeof(void*));
+    uintptr_t first;
+    std::memcpy(&first, &function, sizeof first);
+    return static_cast<long>((first - 1) / sizeof(void*));
 }
-} // namespace
 
 TEST(InterfaceLayout, SlotsInHostOrder)
 {
-    EXPECT_EQ(SlotOf(&HFPlugin::Initialize), 2);
-    EXPECT_EQ(SlotOf(&HFPlugin::InitilaizeFromPreference), 3);
-    EXPECT_EQ(SlotOf(&HFPlugin::GetVersion), 4);
-    EXPECT_EQ(SlotOf(&HFPlugin::GetDisplayName), 5);
-    EXPECT_EQ(SlotOf(&HFPlugin::GetShortName), 6);
-    EXPECT_EQ(SlotOf(&HFPlugin::GetSupportedFileExtensions), 7);
-    EXPECT_EQ(SlotOf(&HFPlugin::GetGroupType), 8);
-    EXPECT_EQ(SlotOf(&HFPlugin::ShowPluginUI), 9);
-    EXPECT_EQ(SlotOf(&HFPlugin::GetErrorString), 10);
-    EXPECT_EQ(SlotOf(&HFPlugin::SniffFiles), 11);
-    using WithContent =
+    using Sniff = long (HFPlugin::*)(const wxString&, wxArrayString&, JobInfoCollection&);
+    using SniffWithContent =
         long (HFPlugin::*)(const wxString&, wxArrayString&, JobInfoCollection&, FolderContent*&);
-    using WithoutContent = long (HFPlugin::*)(const wxString&, wxArrayString&, JobInfoCollection&);
-    EXPECT_EQ(SlotOf(static_cast<WithContent>(&HFPlugin::SniffFolder)), 12);
-    EXPECT_EQ(SlotOf(static_cast<WithoutContent>(&HFPlugin::SniffFolder)), 13);
-    EXPECT_EQ(SlotOf(&HFPlugin::Process), 14);
-    EXPECT_EQ(SlotOf(&HFPlugin::SavePreference), 15);
-    EXPECT_EQ(SlotOf(&HFPlugin::LoadPreference), 16);
-    EXPECT_EQ(SlotOf(&HFPlugin::IsInitialized), 17);
-    EXPECT_EQ(SlotOf(&HFPlugin::DeInitialize), 18);
-    EXPECT_EQ(SlotOf(&HFPlugin::GetServerKeys), 19);
-    EXPECT_EQ(SlotOf(&HFPlugin::IsMergeEnabled), 20);
-    EXPECT_EQ(SlotOf(&HFPlugin::EnableMerge), 21);
+    const long withContent = SlotOf(static_cast<SniffWithContent>(&HFPlugin::SniffFolder));
+    const long withoutContent = SlotOf(static_cast<Sniff>(&HFPlugin::SniffFolder));
+    // Slots 0 and 1 hold the destructors; the functions follow in this order.
+#define SLOT(function) SlotOf(&HFPlugin::function)
+    const long slots[] = {SLOT(Initialize),     SLOT(InitilaizeFromPreference),
+                          SLOT(GetVersion),     SLOT(GetDisplayName),
+                          SLOT(GetShortName),   SLOT(GetSupportedFileExtensions),
+                          SLOT(GetGroupType),   SLOT(ShowPluginUI),
+                          SLOT(GetErrorString), SLOT(SniffFiles),
+                          withContent,          withoutContent,
+                          SLOT(Process),        SLOT(SavePreference),
+                          SLOT(LoadPreference), SLOT(IsInitialized),
+                          SLOT(DeInitialize),   SLOT(GetServerKeys),
+                          SLOT(IsMergeEnabled), SLOT(EnableMerge)};
+#undef SLOT
+    for (long i = 0; i < static_cast<long>(std::size(slots)); ++i)
+        EXPECT_EQ(slots[i], i + 2) << "function number " << i + 1;
     EXPECT_EQ(SlotOf(&IProgressTracker::ReportProgress), 0);
 }
 
 TEST(InterfaceLayout, DescriptionRecordOrder)
 {
-    // Offsets measured on an object: the record holds wx members, so it is
-    // not standard layout and offsetof is not portable on it.
+    // Offsets measured on an object: the record holds toolkit members, so it
+    // is not standard layout and offsetof is not portable on it.
     const PluginInfo info;
-    auto at = [&info](const void* member)
-    { return static_cast<const char*>(member) - reinterpret_cast<const char*>(&info); };
-    EXPECT_EQ(at(&info.m_llKind), 0);
-    EXPECT_LT(at(&info.m_strVersion), at(&info.m_strIdentifier));
-    EXPECT_LT(at(&info.m_strIdentifier), at(&info.m_strDisplayName));
-    EXPECT_LT(at(&info.m_strDisplayName), at(&info.m_arrExtensions));
-    EXPECT_LT(at(&info.m_arrExtensions), at(&info.m_strHostReserved));
-    EXPECT_EQ(at(&info.m_arrRequiredServerFeatures) - at(&info.m_strHostReserved),
-              static_cast<ptrdiff_t>(sizeof(wxString)));
+#define AT(member)                                                                                 \
+    (reinterpret_cast<const char*>(&info.member) - reinterpret_cast<const char*>(&info))
+    EXPECT_EQ(AT(m_llKind), 0);
+    EXPECT_LT(AT(m_strVersion), AT(m_strIdentifier));
+    EXPECT_LT(AT(m_strIdentifier), AT(m_strDisplayName));
+    EXPECT_LT(AT(m_strDisplayName), AT(m_arrExtensions));
+    EXPECT_LT(AT(m_arrExtensions), AT(m_strHostReserved));
+    EXPECT_EQ(AT(m_arrRequiredServerFeatures) - AT(m_strHostReserved), ptrdiff_t(sizeof(wxString)));
+#undef AT
 }
 
-TEST(JobCollection, OwnsCopiesInOrder)
+TEST(JobCollection, HoldsCopies)
 {
     ReadyToProcessJobInfo job;
-    job.filterId = "Orv.EPS.1";
-    job.jobName = "a.eps";
+    EXPECT_EQ(job.auxValue, 0u); // a new job carries no value
+    job.filterId = "Orv.EPS.1", job.jobName = "a.eps", job.auxText = "aux", job.auxValue = 7;
     job.files.Add("/in/a.eps");
-    job.auxValue = 7;
     JobInfoCollection jobs;
-    jobs.Add(job, 2);
-    job.jobName = "b.eps";
     jobs.Add(job);
-    ASSERT_EQ(jobs.GetCount(), 3u);
-    EXPECT_EQ(jobs[0].jobName, "a.eps");
-    EXPECT_EQ(jobs[1].jobName, "a.eps");
-    EXPECT_EQ(jobs[2].jobName, "b.eps");
-    EXPECT_NE(&jobs[0], &jobs[1]);
-    EXPECT_EQ(jobs[1].files[0], "/in/a.eps");
-    EXPECT_EQ(jobs[1].auxValue, 7u);
+    EXPECT_EQ(jobs[0].filterId + jobs[0].jobName + jobs[0].files[0] + jobs[0].auxText,
+              "Orv.EPS.1a.eps/in/a.epsaux");
+    EXPECT_EQ(jobs[0].auxValue, 7u);
+}
+
+TEST(HostServices, CataloguesBesideTheLibraryAndTheHeaderTheme)
+{
+    HFTranslations* service = HFTranslations::GetInstance();
+    ASSERT_EQ(service, HFTranslations::GetInstance());
+    const wxArrayString languages = service->AvailableLanguages();
+    EXPECT_TRUE(languages.Index("de") >= 0 && languages.Index("fr") >= 0)
+        << service->CatalogDirectory();
+    // Every language's word, English first; a word no catalogue knows is only itself.
+    const wxArrayString inch = service->GetTranslations("inch");
+    EXPECT_TRUE(inch[0] == "inch" && inch.Index("Zoll") > 0 && inch.Index("pouce") > 0);
+    EXPECT_EQ(service->GetTranslations("no such word"), wxArrayString(1, "no such word"));
+    // The selected language reaches the toolkit's own lookups.
+    ASSERT_TRUE(service->SelectLanguage("de"));
+    EXPECT_EQ(service->Translate("Top Left") + "|" + wxGetTranslation("Invalid input file") + "|" +
+                  service->Translate("not in the catalogue"),
+              wxString::FromUTF8("Oben links|Ungültige Eingabedatei|not in the catalogue"));
+    EXPECT_FALSE(service->SelectLanguage("xx"));
+    EXPECT_EQ(service->GetSelectedLanguage() + "|" + service->Translate("Top Left") + "|" +
+                  wxGetTranslation("Invalid input file"),
+              "|Top Left|Invalid input file");
+    EXPECT_TRUE(service->SelectLanguage("en"));
+    // The header strip above filter panels: dark, with bold white text.
+    const stTheme header = Themer::GetThemeService()->GetTheme("HeaderView");
+    EXPECT_EQ(header.m_background, wxColour(0x3b, 0x4a, 0x5a));
+    EXPECT_TRUE(header.m_foreground == *wxWHITE && header.m_font.GetPointSize() == 11 &&
+                header.m_font.GetWeight() == wxFONTWEIGHT_BOLD);
 }

@@ -1,7 +1,12 @@
+// The list the module exports to hosts, and the two numberings of the image
+// position; cases in tests/data/frame/linked-list-inserts.txt, image-positions.txt.
+#include <sstream>
 #include <vector>
 
 #include <gtest/gtest.h>
 
+#include "CaseTable.h"
+#include "ImagePosition.h"
 #include "LinkedList.h"
 #include "MacMemory.h"
 #include "posix/AllocationFailures.h"
@@ -14,124 +19,87 @@ void RecordDispose(void* item)
     disposed.push_back(*static_cast<int*>(item));
 }
 void OtherDispose(void*) {}
+int values[8] = {0, 1, 2, 3, 4, 5, 6, 7};
 
-std::vector<int> Walk(const LinkedList& list)
+// "items (count, tail, dispose procedure)", walked with the iterator.
+std::string Describe(const LinkedList& list)
 {
-    std::vector<int> items;
+    std::ostringstream text;
     ListIterator it = nullptr;
-    InitIterator(&list, &it);
-    for (; it; Next(&it))
-        items.push_back(*static_cast<int*>(GetData(it)));
-    return items;
+    for (InitIterator(&list, &it); it; Next(&it))
+        text << *static_cast<int*>(GetData(it)) << " ";
+    text << "(" << GetNumberOfItems(&list) << ", ";
+    text << (list.tail ? std::to_string(*static_cast<int*>(GetData(list.tail))) : "-") << ", ";
+    text << (list.dispose == RecordDispose ? "same" : list.dispose ? "other" : "none") << ")";
+    return text.str();
 }
 
-struct Lists : ::testing::Test
+void Fill(LinkedList& list, ListDisposeProc dispose, const std::string& items)
 {
-    int values[8] = {0, 1, 2, 3, 4, 5, 6, 7};
-    LinkedList a{}, b{};
-    void SetUp() override
+    InitLinkedList(&list, dispose);
+    std::istringstream in(items);
+    for (int i; in >> i;)
+        ASSERT_EQ(AddToTail(&list, &values[i]), noErr);
+}
+} // namespace
+
+TEST(LinkedList, InsertListAsTabled)
+{
+    const auto cases = testkit::ReadCaseTable("frame/linked-list-inserts.txt");
+    ASSERT_EQ(cases.size(), 6u);
+    for (const auto& c : cases)
     {
-        disposed.clear();
-        InitLinkedList(&a, RecordDispose);
-        InitLinkedList(&b, RecordDispose);
-    }
-    void TearDown() override
-    {
+        LinkedList a{}, b{};
+        Fill(a, RecordDispose, c[0]);
+        Fill(b, c[2] == "same" ? RecordDispose : OtherDispose, c[1]);
+        ListNode* after = nullptr;
+        for (int i = c[3] == "-" ? -1 : std::stoi(c[3]), n = 0; n <= i; ++n)
+            after = n ? after->next : a.head;
+        EXPECT_EQ(InsertList(&a, &b, after), &a);
+        EXPECT_EQ(Describe(a) + " | " + Describe(b), c[4] + " | " + c[5]) << c[6];
         DestroyList(&a);
         DestroyList(&b);
     }
-    void Fill(LinkedList& list, std::initializer_list<int> indices)
-    {
-        for (int i : indices)
-            ASSERT_EQ(AddToTail(&list, &values[i]), noErr);
-    }
-};
-} // namespace
-
-TEST_F(Lists, AppendKeepsOrderAndCount)
-{
-    Fill(a, {1, 2, 3});
-    EXPECT_EQ(GetNumberOfItems(&a), 3u);
-    EXPECT_EQ(Walk(a), (std::vector<int>{1, 2, 3}));
-    EXPECT_EQ(GetNumberOfItems(nullptr), 0u);
-    EXPECT_EQ(GetData(nullptr), nullptr);
 }
 
-TEST_F(Lists, NullArgumentsAreParameterErrors)
+TEST(LinkedList, AppendDestroyAndBadArguments)
 {
-    Fill(a, {1});
+    disposed.clear();
+    LinkedList a{}, b{};
+    Fill(a, RecordDispose, "3 1 2");
     EXPECT_EQ(AddToTail(&a, nullptr), paramErr);
     EXPECT_EQ(AddToTail(nullptr, &values[2]), paramErr);
-    EXPECT_EQ(Walk(a), (std::vector<int>{1}));
-}
-
-TEST_F(Lists, AllocatorFailureReportsItsCode)
-{
-    Fill(a, {1});
     posix::SetAllocationFailuresForTesting(0, 1);
-    EXPECT_EQ(AddToTail(&a, &values[2]), memFullErr);
+    EXPECT_EQ(AddToTail(&a, &values[4]), memFullErr);
     posix::SetAllocationFailuresForTesting(0, 0);
-    EXPECT_EQ(GetNumberOfItems(&a), 1u);
-    EXPECT_EQ(Walk(a), (std::vector<int>{1}));
-}
+    EXPECT_EQ(Describe(a), "3 1 2 (3, 2, same)");
+    EXPECT_EQ(InsertList(nullptr, &b, nullptr), nullptr);
+    EXPECT_EQ(InsertList(&a, nullptr, nullptr), &a);
 
-TEST_F(Lists, DestroyDisposesEachItemInOrderAndClearsTheRecord)
-{
-    Fill(a, {3, 1, 2});
-    DestroyList(&a);
+    ListIterator it = a.head;
+    InitIterator(nullptr, &it); // no list: the iterator is left alone
+    EXPECT_EQ(it, a.head);
+    InitIterator(&a, nullptr);
+    Next(nullptr);
+    EXPECT_EQ(GetNumberOfItems(nullptr), 0u);
+    EXPECT_EQ(GetData(nullptr), nullptr);
+
+    DestroyList(&a); // each item disposed in order, the record cleared
     EXPECT_EQ(disposed, (std::vector<int>{3, 1, 2}));
-    EXPECT_EQ(a.head, nullptr);
-    EXPECT_EQ(a.tail, nullptr);
-    EXPECT_EQ(a.count, 0u);
-    EXPECT_EQ(a.dispose, nullptr);
+    EXPECT_TRUE(a.head == nullptr && Describe(a) == "(0, -, none)");
     DestroyList(nullptr);
 }
 
-TEST_F(Lists, InsertIntoEmptyMovesEverything)
+TEST(ImagePositions, BothNumberings)
 {
-    Fill(b, {1, 2});
-    EXPECT_EQ(InsertList(&a, &b, nullptr), &a);
-    EXPECT_EQ(GetNumberOfItems(&a), 2u);
-    EXPECT_EQ(Walk(a), (std::vector<int>{1, 2}));
-    EXPECT_EQ(b.count, 0u);
-    EXPECT_EQ(b.head, nullptr);
-    EXPECT_EQ(b.dispose, nullptr);
-}
-
-TEST_F(Lists, InsertAtFrontMiddleAndEnd)
-{
-    Fill(a, {1, 2, 3});
-    Fill(b, {6, 7});
-    InsertList(&a, &b, nullptr);
-    EXPECT_EQ(Walk(a), (std::vector<int>{6, 7, 1, 2, 3}));
-
-    InitLinkedList(&b, RecordDispose);
-    Fill(b, {4, 5});
-    InsertList(&a, &b, a.tail);
-    EXPECT_EQ(Walk(a), (std::vector<int>{6, 7, 1, 2, 3, 4, 5}));
-    EXPECT_EQ(*static_cast<int*>(GetData(a.tail)), 5);
-
-    InitLinkedList(&b, RecordDispose);
-    Fill(b, {0});
-    ListNode* second = a.head->next; // holds 7
-    InsertList(&a, &b, second);
-    EXPECT_EQ(Walk(a), (std::vector<int>{6, 7, 0, 1, 2, 3, 4, 5}));
-    EXPECT_EQ(GetNumberOfItems(&a), 8u);
-}
-
-TEST_F(Lists, InsertRefusesMismatchedOrEmptySources)
-{
-    Fill(a, {1});
-    LinkedList other{};
-    InitLinkedList(&other, OtherDispose);
-    AddToTail(&other, &values[2]);
-    EXPECT_EQ(InsertList(&a, &other, nullptr), &a);
-    EXPECT_EQ(Walk(a), (std::vector<int>{1}));
-    EXPECT_EQ(GetNumberOfItems(&other), 1u);
-    DestroyList(&other);
-
-    EXPECT_EQ(InsertList(&a, &b, nullptr), &a); // empty source
-    EXPECT_EQ(GetNumberOfItems(&a), 1u);
-    EXPECT_EQ(InsertList(nullptr, &b, nullptr), nullptr);
-    EXPECT_EQ(InsertList(&a, nullptr, nullptr), &a);
+    const auto cases = testkit::ReadCaseTable("frame/image-positions.txt");
+    ASSERT_EQ(cases.size(), 12u);
+    for (const auto& c : cases)
+    {
+        const int n = std::stoi(c[1]),
+                  converted = c[0] == "to-panel"
+                                  ? int(ConvertFromImgPos(static_cast<FilterImgPosition_t>(n)))
+                                  : int(ConvertToImgPos(static_cast<ImagePosition_t>(n)));
+        EXPECT_EQ(converted, std::stoi(c[2])) << c[3];
+    }
 }

@@ -1,28 +1,21 @@
 #pragma once
 // A German user's client setup: the workstation language file says de_DE and
 // the client configuration is version 3.3, the first that follows it. Both go
-// to a private home, to be set up before the toolkit and the client
-// configuration are first used. Returns that home, for removal at the end.
+// to a private home, set up before the toolkit and the client configuration
+// are first used, and removed with everything in it when the program ends.
 #include <cstdlib>
-#include <filesystem>
-#include <fstream>
-#include <string>
 
-#include <unistd.h>
+#include "TestKit.h"
 
-inline std::filesystem::path UseGermanClientConfiguration(const std::string& purpose)
+inline void UseGermanClientConfiguration()
 {
-    namespace fs = std::filesystem;
-    const fs::path home =
-        fs::temp_directory_path() / ("hf-" + purpose + "-" + std::to_string(getpid()));
-    fs::create_directories(home / "Vomal QDK");
-    fs::create_directories(home / "Resources");
-    std::ofstream(home / "Vomal QDK" / "current.lang") << "de_DE\n";
-    std::ofstream(home / "Resources" / "HFConfig.cfg")
-        << "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<HFConfig><Application>"
-           "<HFConfiguration><Entry key=\"APP_HF_VERSION\" value=\"3.3\"/></HFConfiguration>"
-           "</Application></HFConfig>\n";
-    setenv("HOME", home.c_str(), 1);
-    setenv("HOTFOLDER_RESOURCES_DIR", (home / "Resources").c_str(), 1);
-    return home;
+    static const testkit::ScratchDir home("hf-ui-german");
+    const std::string resources = home.Sub("Resources");
+    testkit::WriteFile(home.Sub("Vomal QDK") + "/current.lang", "de_DE\n");
+    testkit::WriteFile(resources + "/HFConfig.cfg",
+                       "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<HFConfig><Application>"
+                       "<HFConfiguration><Entry key=\"APP_HF_VERSION\" value=\"3.3\"/>"
+                       "</HFConfiguration></Application></HFConfig>\n");
+    setenv("HOME", home.Path().c_str(), 1);
+    setenv("HOTFOLDER_RESOURCES_DIR", resources.c_str(), 1);
 }

@@ -1,69 +1,23 @@
 // Renders the EPS settings panel and the custom page size dialog to PNG
-// files, for the documentation. Usage: ui_panel_screenshots <dir> <en|de>
+// files, for the documentation (scripts/screenshots.sh).
+// Usage: ui_panel_screenshots <dir> <en|de>
 #include <wx/app.h>
 #include <wx/dcmemory.h>
 #include <wx/dcscreen.h>
 #include <wx/frame.h>
 #include <wx/image.h>
 #include <wx/sizer.h>
-#include <wx/stopwatch.h>
 #include <wx/timer.h>
-
-#include <vector>
 
 #include <hotfolder/HFTranslations.h>
 
-#include "ControlIds.h"
-#include "GermanClient.h"
 #include "CustomPageSizeDlg.h"
+#include "GermanClient.h"
 #include "ImageSizePanelWithoutMerge.h"
 #include "PanelFactories.h"
 
 namespace
 {
-void Pump(int milliseconds)
-{
-    wxStopWatch watch;
-    while (watch.Time() < milliseconds)
-    {
-        wxTheApp->ProcessPendingEvents();
-        wxYield();
-        wxMilliSleep(10);
-    }
-}
-
-// Reads back what the display shows of the windows, in one snapshot: the
-// screen device keeps the first picture it took.
-bool SaveWindows(const std::vector<std::pair<wxWindow*, wxString>>& shots)
-{
-    wxScreenDC screen;
-    const wxSize size = screen.GetSize();
-    wxBitmap whole(size);
-    wxMemoryDC memory(whole);
-    memory.Blit(0, 0, size.x, size.y, &screen, 0, 0);
-    memory.SelectObject(wxNullBitmap);
-    bool ok = true;
-    for (const auto& [window, path] : shots)
-        ok = whole.GetSubBitmap(window->GetScreenRect()).SaveFile(path, wxBITMAP_TYPE_PNG) && ok;
-    return ok;
-}
-
-wxString ReadFile(const wxString& path)
-{
-    wxString text;
-    if (FILE* file = fopen(path.mb_str(), "rb"))
-    {
-        char buffer[4096];
-        size_t read = 0;
-        std::string bytes;
-        while ((read = fread(buffer, 1, sizeof buffer, file)) > 0)
-            bytes.append(buffer, read);
-        fclose(file);
-        text = wxString::FromUTF8(bytes.c_str());
-    }
-    return text;
-}
-
 class ScreenshotApp : public wxApp
 {
 public:
@@ -71,13 +25,13 @@ public:
     {
         if (argc < 3)
             return false;
-        const wxString directory = argv[1];
-        const wxString language = argv[2];
+        const wxString prefix = argv[1] + "/", suffix = "-" + argv[2] + ".png";
         wxInitAllImageHandlers();
-        HFTranslations::GetInstance()->SelectLanguage(language);
+        HFTranslations::GetInstance()->SelectLanguage(argv[2]);
 
         auto* frame = new wxFrame(nullptr, wxID_ANY, "EPS", wxPoint(0, 0));
-        const wxString xml = ReadFile(wxString(HF_TEST_DATA_DIR) + "/ui/server-ui.xml");
+        const wxString xml =
+            wxString::FromUTF8(testkit::ReadFile(HF_TEST_DATA_DIR "/ui/server-ui.xml"));
         auto* panel = wxDynamicCast(ImageSizePanelWithoutMerge_Factory::CreateInstance(
                                         frame, xml, "EPS", ".eps", true, true),
                                     ImageSizePanelWithoutMerge);
@@ -98,15 +52,25 @@ public:
             13.89, 1, 19.44, 8.5, 11, UNIT_INCH, heightIsLength);
         // Beside the frame: without a window manager nothing stacks them.
         dialog->Move(frame->GetSize().x + 20, 0);
-        // A dialog is drawn for sure only inside its own modal loop.
+        // A dialog is drawn for sure only inside its own modal loop. The
+        // screen is read back in one snapshot: the screen device keeps the
+        // first picture it took.
         wxTimer timer;
         timer.Bind(wxEVT_TIMER,
                    [&](wxTimerEvent&)
                    {
-                       Pump(500);
-                       m_ok = SaveWindows(
-                           {{panel, directory + "/settings-panel-" + language + ".png"},
-                            {dialog, directory + "/custom-page-size-" + language + ".png"}});
+                       for (int i = 0; i < 50; ++i, wxMilliSleep(10))
+                           wxYield();
+                       wxScreenDC screen;
+                       wxBitmap whole(screen.GetSize());
+                       wxMemoryDC memory(whole);
+                       memory.Blit(wxPoint(0, 0), screen.GetSize(), &screen, wxPoint(0, 0));
+                       memory.SelectObject(wxNullBitmap);
+                       m_ok =
+                           whole.GetSubBitmap(panel->GetScreenRect())
+                               .SaveFile(prefix + "settings-panel" + suffix, wxBITMAP_TYPE_PNG) &&
+                           whole.GetSubBitmap(dialog->GetScreenRect())
+                               .SaveFile(prefix + "custom-page-size" + suffix, wxBITMAP_TYPE_PNG);
                        dialog->EndModal(wxID_OK);
                    });
         timer.StartOnce(500);
@@ -129,11 +93,7 @@ int main(int argc, char** argv)
     // The German pictures show what a German user sees: the application
     // language, and with it the panel's decimal separator, come from the
     // client configuration, not only the catalogue.
-    std::filesystem::path germanHome;
     if (argc >= 3 && std::string(argv[2]) == "de")
-        germanHome = UseGermanClientConfiguration("screenshots");
-    const int status = wxEntry(argc, argv);
-    if (!germanHome.empty())
-        std::filesystem::remove_all(germanHome);
-    return status;
+        UseGermanClientConfiguration();
+    return wxEntry(argc, argv);
 }

@@ -1,11 +1,14 @@
-// Panel logic that needs no window: enabling rules, page keys, range checks,
-// separator exchange and the custom size keystroke filter.
-#include <memory>
+// Panel logic that needs no window, over the cases in
+// tests/data/ui/logic.txt: enabling rules, range checks, paper lookup, place
+// holders and the custom size keystroke filter.
+#include <functional>
+#include <map>
 
 #include <gtest/gtest.h>
 #include <wx/init.h>
 
-#include "ControlIds.h"
+#include "CaseTable.h"
+#include "ControlNames.h"
 #include "EnablingRules.h"
 #include "ImageDimensionRange.h"
 #include "PageSizeKeys.h"
@@ -14,201 +17,125 @@
 
 namespace
 {
-// The translation service finds its catalogues through the application object.
-class ToolkitBase : public ::testing::Environment
+using Args = std::vector<wxString>;
+
+// The final state every control was asked for, in the names' order.
+std::string States(const EnableRequests& requests)
 {
-public:
-    void SetUp() override { m_init = std::make_unique<wxInitializer>(); }
-    void TearDown() override { m_init.reset(); }
-
-private:
-    std::unique_ptr<wxInitializer> m_init;
-};
-::testing::Environment* const g_toolkit = ::testing::AddGlobalTestEnvironment(new ToolkitBase);
-} // namespace
-
-TEST(EnablingRules, CustomSizeLeavesOnlyTheDrivingFieldEditable)
-{
-    EnableRequests requests;
-    CustomSizeSelectionRule(requests, true, true, false);
-    EXPECT_EQ(1, RequestedState(requests, ID_WIDTH_TEXT));
-    EXPECT_EQ(1, RequestedState(requests, ID_WIDTH_UNIT_COMBO));
-    EXPECT_EQ(0, RequestedState(requests, ID_HEIGHT_TEXT));
-    EXPECT_EQ(0, RequestedState(requests, ID_HEIGHT_UNIT_COMBO));
-    EXPECT_EQ(1, RequestedState(requests, ID_CONSTRAIN_CHECK));
-
-    requests.clear();
-    CustomSizeSelectionRule(requests, true, false, true);
-    EXPECT_EQ(0, RequestedState(requests, ID_WIDTH_TEXT));
-    EXPECT_EQ(1, RequestedState(requests, ID_HEIGHT_TEXT));
-
-    requests.clear();
-    CustomSizeSelectionRule(requests, false, true, false);
-    for (int id : {ID_CONSTRAIN_CHECK, ID_WIDTH_RADIO, ID_HEIGHT_RADIO, ID_WIDTH_TEXT,
-                   ID_HEIGHT_TEXT, ID_WIDTH_UNIT_COMBO, ID_HEIGHT_UNIT_COMBO})
-        EXPECT_EQ(0, RequestedState(requests, id)) << id;
-    EXPECT_EQ(-1, RequestedState(requests, ID_FITTOPAGE_RADIO));
+    std::string out;
+    for (const auto& [name, id] : ui_test::ControlNames())
+        if (RequestedState(requests, id) >= 0)
+            out += (out.empty() ? "" : " ") + name + "=" +
+                   std::to_string(RequestedState(requests, id));
+    return out;
 }
 
-TEST(EnablingRules, ConstrainOffFreesBothDimensionsAndHidesTheChoice)
+template <typename Rule> std::function<std::string(const Args&)> RuleCase(Rule rule)
 {
-    EnableRequests requests;
-    ConstrainSelectionRule(requests, false, true, true, false);
-    EXPECT_EQ(1, RequestedState(requests, ID_WIDTH_TEXT));
-    EXPECT_EQ(1, RequestedState(requests, ID_HEIGHT_TEXT));
-    EXPECT_EQ(0, RequestedState(requests, ID_WIDTH_RADIO));
-    EXPECT_EQ(0, RequestedState(requests, ID_HEIGHT_RADIO));
-
-    requests.clear();
-    ConstrainSelectionRule(requests, true, true, true, false);
-    EXPECT_EQ(1, RequestedState(requests, ID_WIDTH_RADIO));
-    EXPECT_EQ(0, RequestedState(requests, ID_HEIGHT_TEXT));
+    return [rule](const Args& a)
+    {
+        EnableRequests requests;
+        rule(requests, a);
+        return States(requests);
+    };
 }
 
-TEST(EnablingRules, OutputTypeSwitchesEveryPageAndImageControl)
+bool On(const wxString& word)
 {
-    EnableRequests requests;
-    PageAndImageGroupRule(requests, false);
-    for (int id : std::initializer_list<int>{
-             ID_PAGESIZE_COMBO, ID_CUSTOMPAGESIZE_BUTTON, ID_IMAGEPOSITION_LABEL,
-             ID_IMAGEPOSITION_COMBO, ID_PAGESIZE_LABEL, ID_ORIGINALSIZE_RADIO, ID_CUSTOMSIZE_RADIO,
-             ID_AUTOSCALE_RADIO, ID_SCALETOPRINT_CHECK})
-        EXPECT_EQ(0, RequestedState(requests, id)) << id;
-    EXPECT_EQ(-1, RequestedState(requests, ID_OUTPUT_PS_RADIO));
+    return word == "1";
+}
+double Number(const wxString& text)
+{
+    return std::stod(text.ToStdString());
 }
 
-TEST(PageSizeKeys, CustomSizeIsTruncatedInTheCommandAndKeptInTheBox)
-{
-    stCustomPageSizeAttribute custom;
-    custom.LeftHWMargin = 5;
-    custom.RightHWMargin = 6;
-    custom.TopHWMargin = 7;
-    custom.BottomHWMargin = 8;
-    custom.command = " pop pop setpagedevice";
-    MapPropToValue settings;
-    WriteCustomPageKeys(settings, 595.5, 842.9, custom, UNIT_MM);
-
-    EXPECT_EQ("595.500000", settings["FORCEPAGESIZEX"]);
-    EXPECT_EQ("842.900000", settings["FORCEPAGESIZEY"]);
-    EXPECT_EQ("5", settings["IMAGEEABLESIZELLX"]);
-    EXPECT_EQ("8", settings["IMAGEEABLESIZELLY"]);
-    EXPECT_EQ("589.500000", settings["IMAGEEABLESIZEURX"]);
-    EXPECT_EQ("835.900000", settings["IMAGEEABLESIZEURY"]);
-    EXPECT_EQ("595.500000", settings["CUSTOMPAGEWIDTH"]);
-    EXPECT_EQ("842.900000", settings["CUSTOMPAGEHEIGHT"]);
-    EXPECT_EQ("1", settings["CUSTOMPAGETUNIT"]);
-    EXPECT_EQ("1", settings["CUSTOMPAGESIZE"]);
-    EXPECT_EQ("\n595 842 0 0 1 pop pop setpagedevice", settings["PAGESIZE_COMMAND"]);
-    EXPECT_EQ(11u, settings.size());
-}
-
-TEST(PageSizeKeys, SheetLookupIsCaseSensitiveAndTakesTheFirstMatch)
-{
-    std::vector<stPageAttribute> sheets(3);
-    sheets[0].PaperName = "Letter";
-    sheets[0].PaperDisplayName = "Letter";
-    sheets[1].PaperName = "A4";
-    sheets[1].PaperDisplayName = "A4 paper";
-    sheets[2].PaperName = "A4b";
-    sheets[2].PaperDisplayName = "A4 paper";
-    EXPECT_EQ(&sheets[1], FindSheetByDisplayName(sheets, "A4 paper"));
-    EXPECT_EQ(nullptr, FindSheetByDisplayName(sheets, "a4 paper"));
-    EXPECT_EQ(&sheets[2], FindSheetByPaperName(sheets, "A4b"));
-    EXPECT_EQ(nullptr, FindSheetByPaperName(sheets, "A5"));
-
-    EXPECT_EQ("8.50in x 11.00in", CustomPageEntryText(8.5, 11, UNIT_INCH));
-    EXPECT_EQ("215.90mm x 279.40mm", CustomPageEntryText(215.9, 279.4, UNIT_MM));
-}
-
-TEST(ImageDimensionRange, InchAndMillimetreLimitsAreInclusiveAndNotSymmetric)
-{
-    EXPECT_TRUE(CheckImageDimension(48, "inch").valid);
-    EXPECT_TRUE(CheckImageDimension(0.25, "inch").valid);
-    const ImageDimensionCheck tooWide = CheckImageDimension(48.01, "inch");
-    EXPECT_FALSE(tooWide.valid);
-    EXPECT_EQ("(0.25in - 48in)", tooWide.rangeText);
-    EXPECT_EQ("0.25", tooWide.resetText);
-    EXPECT_FALSE(CheckImageDimension(0.24, "INCH").valid);
-
-    EXPECT_TRUE(CheckImageDimension(5, "mm").valid);
-    EXPECT_TRUE(CheckImageDimension(6, "mm").valid); // below a quarter inch, still accepted
-    EXPECT_TRUE(CheckImageDimension(1220, "mm").valid);
-    const ImageDimensionCheck tooSmall = CheckImageDimension(4.99, "mm");
-    EXPECT_FALSE(tooSmall.valid);
-    EXPECT_EQ("(5mm - 1220mm)", tooSmall.rangeText);
-    EXPECT_EQ("5", tooSmall.resetText);
-
-    EXPECT_TRUE(CheckImageDimension(-3, "point").valid);
-}
-
-TEST(ImageDimensionRange, SeparatorExchangeBothWays)
-{
-    EXPECT_EQ("8.5", ExchangeDecimalSeparator("8,5", ",", true));
-    EXPECT_EQ("8,5", ExchangeDecimalSeparator("8.5", ",", false));
-    EXPECT_EQ("8,5", ExchangeDecimalSeparator("8,5", ".", true));
-    EXPECT_EQ("8.5", ExchangeDecimalSeparator("8.5", ".", false));
-}
-
-TEST(PlaceHolders, ReplacedInOrderOnlyWhenTheListsMatch)
-{
-    wxArrayString placeholders, replacements;
-    placeholders.Add("[A]");
-    placeholders.Add("[B]");
-    replacements.Add("1");
-    wxString message = "[A] and [B] and [A]";
-    ReplacePlaceHolderString(message, placeholders, replacements);
-    EXPECT_EQ("[A] and [B] and [A]", message);
-
-    replacements.Add("2");
-    ReplacePlaceHolderString(message, placeholders, replacements);
-    EXPECT_EQ("1 and 2 and [A]", message);
-}
-
-namespace
-{
-// Types `text` character by character, as the field sees it.
-SizeKeystrokeResult TypeInto(wxString field, const wxString& typed, double maximum,
-                             const wxString& point = ".")
+// Types `typed` key by key into a field holding `start`, with the caret at
+// "^" or at the end.
+std::string Typed(const Args& a)
 {
     SizeKeystrokeResult result;
-    result.text = field;
-    result.insertion = field.length();
-    result.lastAccepted = field;
-    for (wxUniChar ch : typed)
+    wxString start = a[0] == "-" ? "" : a[0];
+    const int caret = start.Find('^');
+    start.Replace("^", "");
+    result.text = result.lastAccepted = start;
+    result.insertion = caret == wxNOT_FOUND ? start.length() : caret;
+    for (wxUniChar ch : a[1])
     {
         wxString text = result.text;
         text.insert(result.insertion, 1, ch);
-        result =
-            FilterSizeKeystroke(text, result.insertion + 1, point, maximum, result.lastAccepted);
+        result = FilterSizeKeystroke(text, result.insertion + 1, a[3], Number(a[2]),
+                                     result.lastAccepted);
     }
-    return result;
+    return result.text.ToStdString() + " @" + std::to_string(result.insertion);
 }
+
+std::vector<stPageAttribute> Sheets()
+{
+    std::vector<stPageAttribute> sheets(3);
+    const char* names[][2] = {{"Letter", "Letter"}, {"A4", "A4 paper"}, {"A4b", "A4 paper"}};
+    for (int i = 0; i < 3; ++i)
+        sheets[i].PaperName = names[i][0], sheets[i].PaperDisplayName = names[i][1];
+    return sheets;
+}
+
+std::string Found(const stPageAttribute* sheet)
+{
+    return sheet ? sheet->PaperName.ToStdString() : "none";
+}
+
+const std::map<std::string, std::function<std::string(const Args&)>> kCases = {
+    {"custom-size", RuleCase([](EnableRequests& r, const Args& a)
+                             { CustomSizeSelectionRule(r, On(a[0]), On(a[1]), On(a[2])); })},
+    {"constrain", RuleCase([](EnableRequests& r, const Args& a)
+                           { ConstrainSelectionRule(r, On(a[0]), On(a[1]), On(a[2]), On(a[3])); })},
+    {"autoscale",
+     RuleCase([](EnableRequests& r, const Args& a) { AutoScaleSelectionRule(r, On(a[0])); })},
+    {"width-height",
+     RuleCase([](EnableRequests& r, const Args& a) { WidthHeightRule(r, On(a[0])); })},
+    {"page-and-image",
+     RuleCase([](EnableRequests& r, const Args& a) { PageAndImageGroupRule(r, On(a[0])); })},
+    {"dimension",
+     [](const Args& a)
+     {
+         const ImageDimensionCheck check = CheckImageDimension(Number(a[0]), a[1]);
+         return check.valid ? std::string("valid")
+                            : "invalid " + check.rangeText.ToStdString() + " reset " +
+                                  check.resetText.ToStdString();
+     }},
+    {"entry-text",
+     [](const Args& a)
+     {
+         return CustomPageEntryText(Number(a[0]), Number(a[1]), a[2] == "mm" ? UNIT_MM : UNIT_INCH)
+             .ToStdString();
+     }},
+    {"type", Typed},
+    {"placeholders",
+     [](const Args& a)
+     {
+         wxString message = a[0];
+         ReplacePlaceHolderString(message, wxSplit(a[1], ','), wxSplit(a[2], ','));
+         return message.ToStdString();
+     }},
+    {"sheet-by-display",
+     [](const Args& a) { return Found(FindSheetByDisplayName(Sheets(), a[0])); }},
+    {"sheet-by-name", [](const Args& a) { return Found(FindSheetByPaperName(Sheets(), a[0])); }},
+};
 } // namespace
 
-TEST(SizeKeystrokeFilter, ValueAboveTheMaximumRevertsToTheLastAcceptedText)
+TEST(PanelLogic, CasesAsTabled)
 {
-    const SizeKeystrokeResult result = TypeInto("", "1001", 1000);
-    EXPECT_EQ("100", result.text);
-    EXPECT_EQ(3, result.insertion);
-    EXPECT_EQ("1000", TypeInto("", "1000", 1000).text);
-}
-
-TEST(SizeKeystrokeFilter, LettersSecondSeparatorAndThirdDecimalAreUndone)
-{
-    EXPECT_EQ("12", TypeInto("", "1a2", 1000).text);
-    EXPECT_EQ("1.5", TypeInto("", "1.5.", 1000).text);
-    EXPECT_EQ("1.25", TypeInto("", "1.257", 1000).text);
-    EXPECT_EQ("1,25", TypeInto("", "1,257", 1000, ",").text);
-    EXPECT_EQ("15", TypeInto("", "1.5", 1000, ",").text); // "." is not this locale's point
-    EXPECT_EQ("8", TypeInto("", "-8e", 1000).text);
-}
-
-TEST(SizeKeystrokeFilter, EditInTheMiddleRemovesTheTypedCharacterOnly)
-{
-    const SizeKeystrokeResult result = FilterSizeKeystroke("1x23", 2, ".", 1000, "123");
-    EXPECT_EQ("123", result.text);
-    EXPECT_EQ(1, result.insertion);
-    EXPECT_DOUBLE_EQ(12.5, ParseSizeField("12,5", ","));
-    EXPECT_TRUE(IsSeparatorAlreadyEntered("1,2,", ","));
-    EXPECT_FALSE(IsSeparatorAlreadyEntered("1,2", ","));
+    const wxInitializer toolkit; // the translation service finds its catalogues through it
+    const auto cases = testkit::ReadCaseTable("ui/logic.txt");
+    ASSERT_GE(cases.size(), 40u);
+    for (const auto& c : cases)
+    {
+        ASSERT_EQ(c.size(), 4u) << c[0];
+        SCOPED_TRACE(c[0] + " | " + c[1] + " | " + c[3]);
+        ASSERT_EQ(kCases.count(c[0]), 1u);
+        Args args;
+        for (size_t start = 0, slash = 0; slash != std::string::npos; start = slash + 3)
+            args.push_back(
+                wxString::FromUTF8(c[1].substr(start, (slash = c[1].find(" / ", start)) - start)));
+        EXPECT_EQ(c[2], kCases.at(c[0])(args));
+    }
 }
