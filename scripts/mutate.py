@@ -253,6 +253,43 @@ def copy_tree(dest):
         shutil.copy2(src, dst)
 
 
+def round_robin(by_area, areas, sample):
+    """Takes each area in turn so that a cut sample still covers each one."""
+    sampled = []
+    queues = [list(by_area[a]) for a in areas if by_area[a]]
+    while any(queues):
+        for q in queues:
+            if q:
+                sampled.append(q.pop(0))
+    return sampled[:sample] if sample else sampled
+
+
+def listed_mutants(listing, areas):
+    """The mutants of a list written by --list. Random sampling depends on
+    every product file, so a sample is repeated from its list: each mutant is
+    found again in today's file by its change, nearest the line it had."""
+    found, texts = [], {}
+    with open(listing, encoding="utf-8") as fh:
+        entries = [l.rstrip("\n").split("\t", 1) for l in fh if "\t" in l]
+    for place, change in entries:
+        path, line = place.rsplit(":", 1)
+        if path.split("/")[0] not in areas:
+            continue
+        if path not in texts:
+            try:
+                with open(os.path.join(ROOT, path), encoding="utf-8",
+                          errors="surrogateescape") as fh:
+                    texts[path] = mutants_of(path, fh.read())
+            except FileNotFoundError:
+                texts[path] = []
+        same = [m for m in texts[path] if m.describe() == change]
+        if not same:
+            print(f"mutate: {place} {change}: no longer in the code", file=sys.stderr)
+            continue
+        found.append(min(same, key=lambda m: abs(m.line - int(line))))
+    return found
+
+
 def main():
     parser = argparse.ArgumentParser(description=__doc__.split("\n")[0])
     parser.add_argument("--seed", type=int, default=1)
@@ -263,6 +300,10 @@ def main():
     parser.add_argument("--list", action="store_true")
     parser.add_argument("--keep", action="store_true")
     parser.add_argument("--results")
+    parser.add_argument("--mutants", help="take exactly the mutants listed in this file "
+                        "('path:line<TAB>change' lines, as --list prints them), to repeat "
+                        "an earlier sample on a tree that has changed since; each is found "
+                        "again by its change, nearest its line")
     args = parser.parse_args()
 
     areas = [a for a in (args.area or AREAS) if os.path.isdir(os.path.join(ROOT, a))]
@@ -276,15 +317,10 @@ def main():
         by_area[f.split("/")[0]].extend(candidates[:args.per_file])
     for a in by_area:
         rng.shuffle(by_area[a])
-    # Round-robin across the areas so that a cut sample still covers each one.
-    sampled = []
-    queues = [list(by_area[a]) for a in areas if by_area[a]]
-    while any(queues):
-        for q in queues:
-            if q:
-                sampled.append(q.pop(0))
-    if args.sample:
-        sampled = sampled[:args.sample]
+    if args.mutants:
+        sampled = listed_mutants(args.mutants, areas)
+    else:
+        sampled = round_robin(by_area, areas, args.sample)
 
     if args.list:
         for m in sampled:
