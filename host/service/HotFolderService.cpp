@@ -37,7 +37,7 @@ const uint32_t kFolderEvents =
 // Broken folders are tried again this often.
 const std::chrono::seconds kRetry(5);
 // Files taken from one folder before the others get their turn.
-const size_t kBatch = 32;
+const size_t kBatch = 128;
 
 bool Exists(const wxString& path)
 {

@@ -27,8 +27,8 @@ const char kJobPrefix[] = "svc-";
 const char kOriginals[] = "original";
 const char kSparePrefix[] = "spare-";
 const size_t kSyncWholeBatch = 8;
-// Enough for every job of a batch in hand at once.
-const size_t kSpareLimit = 64;
+// Enough for every job of a batch (128) in hand at once.
+const size_t kSpareLimit = 160;
 
 std::string Native(const wxString& path)
 {
@@ -219,15 +219,22 @@ void ServiceJobs::Retire(const wxString& id)
     const wxString work = WorkDirectory(id);
     if (m_spares.size() < kSpareLimit && Originals(id).empty())
     {
+        // Usually only the originals folder is left; a job started in a
+        // spare relies on finding nothing else there.
+        bool clean = true;
         for (const wxString& name : EntryNames(work))
             if (name != kOriginals)
+            {
                 RemoveEntry(wxFileName(work, name).GetFullPath());
+                clean = false;
+            }
+        clean = clean || EntryNames(work).size() == 1;
         const wxString spare =
             wxFileName(m_places.workFolder,
                        wxString::Format("%s%d-%u", kSparePrefix, static_cast<int>(getpid()),
                                         ++m_spareCounter))
                 .GetFullPath();
-        if (rename(Native(work).c_str(), Native(spare).c_str()) == 0)
+        if (clean && rename(Native(work).c_str(), Native(spare).c_str()) == 0)
         {
             m_spares.push_back(spare);
             return;
@@ -236,15 +243,18 @@ void ServiceJobs::Retire(const wxString& id)
     RemoveTree(work);
 }
 
-JobOutcome ServiceJobs::Continue(const wxString& id, ReadyToProcessJobInfo job)
+void ServiceJobs::ClearEarlierAttempt(const wxString& id)
 {
-    // From step 2 afresh: whatever an earlier attempt left goes.
     const wxString work = WorkDirectory(id);
     for (const wxString& name : EntryNames(work))
         if (name != kOriginals)
             RemoveEntry(wxFileName(work, name).GetFullPath());
     RemoveStaged(id);
+}
 
+JobOutcome ServiceJobs::Continue(const wxString& id, ReadyToProcessJobInfo job)
+{
+    const wxString work = WorkDirectory(id);
     wxString error;
     const wxString workConfig = wxFileName(work, "Folder.cfg").GetFullPath();
     if (!CopyFileTo(m_places.configFile, workConfig, error))
@@ -492,7 +502,10 @@ void ServiceJobs::Recover()
             if (jobs.empty())
                 Fail(entry, jobName, "the filter no longer accepts it");
             else
+            {
+                ClearEarlierAttempt(entry);
                 Continue(entry, jobs[0]);
+            }
         }
     }
     Commit();

@@ -57,7 +57,10 @@ public:
     void Recover();
 
 private:
+    // Steps 2 and 3 in a work directory that holds only the originals.
     JobOutcome Continue(const wxString& id, ReadyToProcessJobInfo job);
+    // What an earlier attempt at the job left beside the originals goes.
+    void ClearEarlierAttempt(const wxString& id);
     struct Staged
     {
         wxString id, name, jobName;
