@@ -25,13 +25,22 @@ if(NOT read EQUAL 0 OR NOT control MATCHES "Package: hotfolder" OR NOT control M
   message(FATAL_ERROR "package control fields wrong:\n${control}")
 endif()
 
+# The maintainer scripts enable the service at install (it starts at boot).
+file(MAKE_DIRECTORY "${SCRATCH}/control")
+execute_process(COMMAND "${DPKG_DEB}" -e ${debs} "${SCRATCH}/control" RESULT_VARIABLE extracted)
+file(READ "${SCRATCH}/control/postinst" postinst)
+if(NOT extracted EQUAL 0 OR NOT postinst MATCHES "deb-systemd-helper enable hotfolder.service"
+    OR NOT EXISTS "${SCRATCH}/control/prerm")
+  message(FATAL_ERROR "the package does not enable and stop the service:\n${postinst}")
+endif()
+
 execute_process(COMMAND "${DPKG_DEB}" -x ${debs} "${SCRATCH}/root" RESULT_VARIABLE unpacked)
 if(NOT unpacked EQUAL 0)
   message(FATAL_ERROR "dpkg-deb -x failed")
 endif()
 set(root "${SCRATCH}/root/usr")
 foreach(file bin/hotfolder lib/hotfolder/filters/EPS.so include/hotfolder/HFPlugin.h
-    lib/cmake/HotFolderSDK/HotFolderSDKConfig.cmake)
+    lib/cmake/HotFolderSDK/HotFolderSDKConfig.cmake lib/systemd/system/hotfolder.service)
   if(NOT EXISTS "${root}/${file}")
     message(FATAL_ERROR "the package lacks /usr/${file}")
   endif()
