@@ -19,18 +19,9 @@ std::string RunOnTerminal(const std::vector<std::string>& args)
         return "no pseudo terminal";
     std::vector<std::string> all = {kHost};
     all.insert(all.end(), args.begin(), args.end());
-    std::vector<char*> argv;
-    for (std::string& arg : all)
-        argv.push_back(arg.data());
-    argv.push_back(nullptr);
-    posix_spawn_file_actions_t actions;
-    posix_spawn_file_actions_init(&actions);
-    posix_spawn_file_actions_adddup2(&actions, slave, 1);
-    posix_spawn_file_actions_adddup2(&actions, slave, 2);
-    posix_spawn_file_actions_addclose(&actions, master);
-    pid_t pid = -1;
-    const bool spawned = posix_spawn(&pid, argv[0], &actions, nullptr, argv.data(), environ) == 0;
-    posix_spawn_file_actions_destroy(&actions);
+    const std::string terminal = ptsname(master);
+    const pid_t pid = testkit::StartProgram(all, terminal, terminal);
+    const bool spawned = pid > 0;
     close(slave);
     std::string text;
     char buffer[4096];
@@ -44,8 +35,7 @@ std::string RunOnTerminal(const std::vector<std::string>& args)
         text.append(buffer, got);
     }
     close(master);
-    if (spawned)
-        waitpid(pid, nullptr, 0);
+    testkit::WaitProgram(pid);
     return text;
 }
 

@@ -2,10 +2,7 @@
 // Runs the built hotfolder program on scratch folders. Every test gets its own
 // scratch directory and its own warehouse (HOTFOLDER_WAREHOUSE_ROOT), so
 // nothing touches the machine-wide store.
-#include <fcntl.h>
 #include <signal.h>
-#include <spawn.h>
-#include <sys/stat.h>
 #include <sys/wait.h>
 
 #include <memory>
@@ -39,20 +36,7 @@ public:
         : m_out(scratch + "/host-out.txt"), m_err(scratch + "/host-err.txt")
     {
         args.insert(args.begin(), kHost);
-        std::vector<char*> argv;
-        for (std::string& arg : args)
-            argv.push_back(arg.data());
-        argv.push_back(nullptr);
-        posix_spawn_file_actions_t actions;
-        posix_spawn_file_actions_init(&actions);
-        posix_spawn_file_actions_addopen(&actions, 0, "/dev/null", O_RDONLY, 0);
-        posix_spawn_file_actions_addopen(&actions, 1, m_out.c_str(), O_WRONLY | O_CREAT | O_TRUNC,
-                                         0644);
-        posix_spawn_file_actions_addopen(&actions, 2, m_err.c_str(), O_WRONLY | O_CREAT | O_TRUNC,
-                                         0644);
-        if (posix_spawn(&m_pid, argv[0], &actions, nullptr, argv.data(), environ) != 0)
-            m_pid = -1;
-        posix_spawn_file_actions_destroy(&actions);
+        m_pid = testkit::StartProgram(args, m_out, m_err);
     }
     ~BackgroundHost() { Signal(SIGKILL), Wait(10000); }
 

@@ -71,14 +71,8 @@ public:
 
         const std::string cupsd = Find("cupsd"), conf = m_root + "/cupsd.conf",
                           filesConf = m_root + "/cups-files.conf";
-        char* argv[] = {const_cast<char*>(cupsd.c_str()),
-                        const_cast<char*>("-f"),
-                        const_cast<char*>("-c"),
-                        const_cast<char*>(conf.c_str()),
-                        const_cast<char*>("-s"),
-                        const_cast<char*>(filesConf.c_str()),
-                        nullptr};
-        if (posix_spawn(&m_pid, cupsd.c_str(), nullptr, nullptr, argv, environ) != 0)
+        m_pid = testkit::StartProgram({cupsd, "-f", "-c", conf, "-s", filesConf}, "", "");
+        if (m_pid <= 0)
         {
             m_pid = 0;
             problem = "cannot start " + cupsd;
