@@ -221,14 +221,7 @@ void ServiceJobs::Retire(const wxString& id)
     {
         // Usually only the originals folder is left; a job started in a
         // spare relies on finding nothing else there.
-        bool clean = true;
-        for (const wxString& name : EntryNames(work))
-            if (name != kOriginals)
-            {
-                RemoveEntry(wxFileName(work, name).GetFullPath());
-                clean = false;
-            }
-        clean = clean || EntryNames(work).size() == 1;
+        const bool clean = !RemoveAllButOriginals(id) || EntryNames(work).size() == 1;
         const wxString spare =
             wxFileName(m_places.workFolder,
                        wxString::Format("%s%d-%u", kSparePrefix, static_cast<int>(getpid()),
@@ -243,12 +236,22 @@ void ServiceJobs::Retire(const wxString& id)
     RemoveTree(work);
 }
 
-void ServiceJobs::ClearEarlierAttempt(const wxString& id)
+bool ServiceJobs::RemoveAllButOriginals(const wxString& id)
 {
     const wxString work = WorkDirectory(id);
+    bool removed = false;
     for (const wxString& name : EntryNames(work))
         if (name != kOriginals)
+        {
             RemoveEntry(wxFileName(work, name).GetFullPath());
+            removed = true;
+        }
+    return removed;
+}
+
+void ServiceJobs::ClearEarlierAttempt(const wxString& id)
+{
+    RemoveAllButOriginals(id);
     RemoveStaged(id);
 }
 

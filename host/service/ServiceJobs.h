@@ -61,6 +61,9 @@ private:
     JobOutcome Continue(const wxString& id, ReadyToProcessJobInfo job);
     // What an earlier attempt at the job left beside the originals goes.
     void ClearEarlierAttempt(const wxString& id);
+    // Everything in the work directory but its originals folder goes; true
+    // when there was something.
+    bool RemoveAllButOriginals(const wxString& id);
     struct Staged
     {
         wxString id, name, jobName;
