@@ -52,7 +52,7 @@ AREAS = OrderedDict([
     ("utils", ["units", "machine", "fuzz"]),
     ("settings_ui", ["units", "ui", "filter"]),
     ("sdk", ["frame", "units"]),
-    ("host", ["host"]),
+    ("host", ["host", "service"]),
     ("printing", ["ppd"]),
     ("posix", ["engine", "store", "machine", "host"]),
 ])

@@ -146,12 +146,10 @@ void Service::Serve(const wxString& path, Entry& entry)
             return;
         }
     }
-    Drop(entry, problem);
     // Reported once for each new reason, not on every retry.
-    static std::map<wxString, wxString> reported;
-    if (reported[path] != problem)
+    if (entry.problem != problem)
         ServiceLog(Severity::Error, "cannot serve " + path + ": " + problem);
-    reported[path] = problem;
+    Drop(entry, problem);
 }
 
 void Service::SyncList()
