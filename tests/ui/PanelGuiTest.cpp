@@ -128,10 +128,12 @@ TEST_F(PanelConversion, SavedChoicesPlaceAndSizeTheArtwork)
     EPS filter("EPS");
     ASSERT_EQ(0, filter.Initialize(TestDataText("ui/server-ui.xml")));
     ASSERT_TRUE(filter.IsFilterEnabled());
+    filter.GetSettings()["IMAGEPOSITION"] = "Top Right";
     m_panel = wxDynamicCast(filter.ShowPluginUI(m_frame), ImageSizePanelWithoutMerge);
     ASSERT_NE(nullptr, m_panel);
     EXPECT_EQ("0", filter.GetSettings()["CUSTOMPAGETUNIT"]); // the server prefers inches
-    RunSteps("click ps; custom 500 700; select position=Bottom Left; click custom; type width=2");
+    // The panel shows the filter's own extension and settings.
+    RunSteps("label input=.eps; shows position=Top Right; click ps; custom 500 700; select position=Bottom Left; click custom; type width=2");
 
     wxXmlNode host(wxXML_ELEMENT_NODE, "Filter");
     ASSERT_EQ(0, filter.SavePreference(&host));
