@@ -42,7 +42,7 @@ TEST_F(SettingsPanel, HeaderStripAndSectionsLook)
     wxString boxes;
     wxWindow* input = nullptr;
     for (wxWindow* child : m_panel->GetChildren())
-        if (auto* box = wxDynamicCast(child, wxStaticBox))
+        if (auto* box = dynamic_cast<wxStaticBox*>(child))
         {
             input = input ? input : box;
             boxes += box->GetLabel() + "; ";

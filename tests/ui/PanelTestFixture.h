@@ -129,9 +129,11 @@ protected:
 
     // The window whose controls the steps address: the open dialog, else the panel.
     wxWindow* Root() const { return m_dialog ? static_cast<wxWindow*>(m_dialog) : m_panel; }
+    // C++'s own type check: the toolkit's class records do not tell a radio
+    // button from a check box, nor a custom window from its base.
     template <typename T = wxWindow> T* Control(const std::string& name) const
     {
-        return wxDynamicCast(Root()->FindWindow(ControlId(name)), T);
+        return dynamic_cast<T*>(Root()->FindWindow(ControlId(name)));
     }
 
     // A control the step needs; a missing one fails the test (as an exception).
