@@ -68,9 +68,9 @@ bool CapabilitiesFromIpp(ipp_t* response, PpdCapabilities& capabilities)
         const double width = PWG_TO_POINTS(size->width);
         const double height = PWG_TO_POINTS(size->length);
         const std::string pwg = name;
-        if (pwg.rfind("custom_min_", 0) == 0 || pwg.rfind("custom_max_", 0) == 0)
+        const bool isMin = pwg.rfind("custom_min_", 0) == 0;
+        if (isMin || pwg.rfind("custom_max_", 0) == 0)
         {
-            const bool isMin = pwg[7] == 'i';
             (isMin ? capabilities.custom.minWidth : capabilities.custom.maxWidth) = width;
             (isMin ? capabilities.custom.minHeight : capabilities.custom.maxHeight) = height;
             continue;

@@ -16,6 +16,9 @@
 //   cupsd                 a private CUPS scheduler from here on (the rest of
 //                         the file is skipped where CUPS is not installed)
 //   queue NAME PPD FILE   a scheduler queue printing to FILE | cupsd-stop
+//   ipp-printer TABLE     from here on the "scheduler" is a network printer
+//                         answering IPP with the attributes of TABLE (under
+//                         tests/data), without a PPD
 // Checks of text: "~T" contains, "!~T" does not, "=T" is exactly, "#N T"
 // contains N times. Arguments are split at blanks; "double quotes" keep
 // blanks. In every field: $S scratch, $H $S/hot, $C its container, $K its
@@ -26,6 +29,7 @@
 
 #include "GhostscriptOracle.h"
 #include "HostTestSupport.h"
+#include "IppOnlyPrinter.h"
 #include "PrivateCupsd.h"
 
 namespace host_test
@@ -62,6 +66,7 @@ private:
         if (verb == "fresh")
         {
             cups.reset();
+            printer.reset();
             scratches.push_back(std::make_unique<testkit::ScratchDir>("hf-host-test"));
             root = scratches.back()->Path();
             setenv("HOTFOLDER_WAREHOUSE_ROOT", (root + "/machine").c_str(), 1);
@@ -133,6 +138,12 @@ private:
         }
         else if (verb == "cupsd-stop")
             cups->Stop();
+        else if (verb == "ipp-printer")
+        {
+            printer = std::make_unique<cups_test::IppOnlyPrinter>(arg);
+            EXPECT_TRUE(printer->Start()) << arg;
+            setenv("CUPS_SERVER", printer->Server().c_str(), 1);
+        }
         else
             ADD_FAILURE() << "unknown step " << verb;
         return !HasFatalFailure();
@@ -176,7 +187,9 @@ private:
         const std::pair<const char*, std::string> names[] = {{"$SERVER", kServer},
                                                              {"$DATA", HF_TEST_DATA_DIR},
                                                              {"$BAD", HF_BAD_MODULE},
-                                                             {"$CUPS", cups ? cups->Server() : ""},
+                                                             {"$CUPS", cups      ? cups->Server()
+                                                                       : printer ? printer->Server()
+                                                                                 : ""},
                                                              {"$EX", kExamples + "/eps"},
                                                              {"$H", hot},
                                                              {"$C", container},
@@ -219,6 +232,7 @@ private:
     std::string root;
     std::vector<std::unique_ptr<testkit::ScratchDir>> scratches;
     std::unique_ptr<cups_test::PrivateCupsd> cups;
+    std::unique_ptr<cups_test::IppOnlyPrinter> printer;
     testkit::ProcessResult last;
 };
 } // namespace host_test
