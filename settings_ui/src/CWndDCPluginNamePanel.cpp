@@ -25,6 +25,11 @@ void CWndDCPluginNamePanel::SetName(const wxString& name)
 void CWndDCPluginNamePanel::OnPaint(wxPaintEvent&)
 {
     wxPaintDC dc(this);
+    Draw(dc);
+}
+
+void CWndDCPluginNamePanel::Draw(wxDC& dc) const
+{
     dc.SetPen(*wxTRANSPARENT_PEN);
     dc.SetBrush(wxBrush(GetBackgroundColour()));
     dc.DrawRectangle(GetClientRect());

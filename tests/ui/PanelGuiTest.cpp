@@ -6,6 +6,7 @@
 // page: the user picks a custom page, a corner and an image width, the host
 // saves, a filter set up from that preference converts, and Ghostscript
 // shows the artwork where the user asked.
+#include <wx/dcmemory.h>
 #include <wx/sizer.h>
 #include <wx/statbox.h>
 #include <wx/timer.h>
@@ -14,6 +15,7 @@
 
 #include <hotfolder/Themer.h>
 
+#include "CWndDCPluginNamePanel.h"
 #include "EPS.h"
 #include "EPStoPS.h"
 #include "GhostscriptOracle.h"
@@ -21,6 +23,27 @@
 #include "SampleEps.h"
 
 using namespace ui_test;
+
+namespace
+{
+std::string Pixels(const wxBitmap& bitmap)
+{
+    const wxImage image = bitmap.ConvertToImage();
+    return std::string(reinterpret_cast<const char*>(image.GetData()),
+                       3 * image.GetWidth() * image.GetHeight());
+}
+
+// The panel's section boxes, each with its distance from the left edge.
+std::string Boxes(wxWindow* panel)
+{
+    std::string boxes;
+    for (wxWindow* child : panel->GetChildren())
+        if (auto* box = dynamic_cast<wxStaticBox*>(child))
+            boxes += box->GetLabel().utf8_string() + " at " + std::to_string(box->GetPosition().x) +
+                     "; ";
+    return boxes;
+}
+} // namespace
 using SettingsPanel = PanelTest;
 using CustomDialog = PanelTest;
 using PanelConversion = PanelTest;
@@ -37,6 +60,24 @@ TEST_F(SettingsPanel, HeaderStripAndSectionsLook)
     wxWindow* header = m_panel->GetChildren().front();
     EXPECT_EQ(header->GetBackgroundColour(), wxColour(0x3b, 0x4a, 0x5a));
     EXPECT_EQ(header->GetSize().y, 22);
+    // The strip shows the filter's name as the toolkit draws it in the
+    // theme's font and colour.
+    const stTheme theme = Themer::GetThemeService()->GetTheme("HeaderView");
+    wxBitmap drawn(header->GetSize()), expected(header->GetSize()), blank(header->GetSize());
+    {
+        wxMemoryDC dc(drawn);
+        dynamic_cast<CWndDCPluginNamePanel&>(*header).Draw(dc);
+        dc.SelectObject(blank);
+        dc.SetBackground(wxBrush(theme.m_background));
+        dc.Clear();
+        dc.SelectObject(expected);
+        dc.Clear();
+        dc.SetFont(theme.m_font);
+        dc.SetTextForeground(theme.m_foreground);
+        dc.DrawText("EPS", 8, 4);
+    }
+    EXPECT_EQ(Pixels(drawn), Pixels(expected));
+    EXPECT_NE(Pixels(drawn), Pixels(blank));
     // Every section box in the host's default theme, in this order.
     const wxColour background = Themer::GetThemeService()->GetTheme("Default").m_background;
     wxString boxes;
@@ -53,6 +94,29 @@ TEST_F(SettingsPanel, HeaderStripAndSectionsLook)
     EXPECT_EQ(input->GetPosition(), wxPoint(5, 22 + 5));
     const wxRect eps = Control("eps")->GetRect();
     EXPECT_EQ(Control("ps")->GetPosition().x - eps.GetRight() - 1, 10);
+}
+
+TEST_F(SettingsPanel, PanelsOtherFiltersShare)
+{
+    const wxString xml = TestDataText("ui/server-ui.xml");
+    const auto find = [](wxWindow* panel, const char* name)
+    { return panel->FindWindow(ControlId(name)); };
+    // Page and output sections alone, with the server's papers, 5 pixels in.
+    wxWindow* page = PageSizePanelWithoutMerge_Factory::CreateInstance(m_frame, xml);
+    page->Layout();
+    EXPECT_TRUE(find(page, "original") == nullptr && find(page, "input") == nullptr);
+    EXPECT_EQ(dynamic_cast<wxComboBox&>(*find(page, "page")).GetCount(), 2u);
+    EXPECT_EQ(Boxes(page), "Page at 5; Output file type at 5; ");
+    // The output section under the header strip and the input type; a filter
+    // that cannot make PDF takes the choice away.
+    auto* output = dynamic_cast<OutputFileTypePanelWithoutMerge*>(
+        OutputFileTypePanelWithoutMerge_Factory::CreateInstance(m_frame, xml, "PDF", ".pdf"));
+    ASSERT_NE(output, nullptr);
+    EXPECT_EQ(Boxes(output), "Input file type at 5; Output file type at 5; ");
+    EXPECT_EQ(find(output, "input")->GetLabel(), ".pdf");
+    EXPECT_TRUE(find(output, "ps")->IsShown() && find(output, "pdf")->IsShown());
+    output->RemovePDFOption();
+    EXPECT_TRUE(find(output, "ps")->IsShown() && !find(output, "pdf")->IsShown());
 }
 
 TEST_F(SettingsPanel, TabOrderFollowsTheLayout)
@@ -133,7 +197,8 @@ TEST_F(PanelConversion, SavedChoicesPlaceAndSizeTheArtwork)
     ASSERT_NE(nullptr, m_panel);
     EXPECT_EQ("0", filter.GetSettings()["CUSTOMPAGETUNIT"]); // the server prefers inches
     // The panel shows the filter's own extension and settings.
-    RunSteps("label input=.eps; shows position=Top Right; click ps; custom 500 700; select position=Bottom Left; click custom; type width=2");
+    RunSteps("label input=.eps; shows position=Top Right; click ps; custom 500 700; select "
+             "position=Bottom Left; click custom; type width=2");
 
     wxXmlNode host(wxXML_ELEMENT_NODE, "Filter");
     ASSERT_EQ(0, filter.SavePreference(&host));
