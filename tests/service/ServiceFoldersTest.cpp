@@ -121,7 +121,9 @@ TEST_F(ServiceTest, BadInputIsReportedAndTheOthersGoOn)
     WriteFile(scratch + "/plain-file", "x");
     ASSERT_EQ(symlink((scratch + "/loop").c_str(), (scratch + "/loop").c_str()), 0);
     const std::string broken = MakePostScriptFolder("A4", "broken");
-    WriteFile(Container(broken) + "/Folder.cfg", "<HotFolder");
+    const std::string brokenConfig = Container(broken) + "/Folder.cfg";
+    const std::string sound = ReadFile(brokenConfig);
+    WriteFile(brokenConfig, "<HotFolder");
     WriteFile(Warehouse() + "/HotFolderList.cfg", list + "</HotFolderList>\n");
 
     auto host = Serve(2);
@@ -140,6 +142,17 @@ TEST_F(ServiceTest, BadInputIsReportedAndTheOthersGoOn)
             testkit::RunProgram({"rm", "-rf", doomed});
             EXPECT_TRUE(WaitFor(
                 [&] { return host->Err().find(doomed + " vanished") != std::string::npos; }, 5000))
+                << host->Err();
+        }
+        else if (kind == "repaired")
+        {
+            WriteFile(brokenConfig, sound);
+            EXPECT_TRUE(
+                WaitFor([&] { return Count(host->Err(), "<6>serving " + broken) == 1; }, 15000))
+                << host->Err();
+            WriteFile(brokenConfig, "<HotFolder");
+            EXPECT_TRUE(
+                WaitFor([&] { return Count(host->Err(), "<3>cannot serve " + broken) == 2; }, 5000))
                 << host->Err();
         }
         else if (kind == "fifo")
