@@ -35,13 +35,10 @@ std::string Copy(FILE* in, FILE* out, long offset, long length)
 
 TEST(Extract, TableOfRanges)
 {
-    const auto cases = testkit::ReadCaseTable("engine/extract.txt");
-    ASSERT_GT(cases.size(), 10u);
     testkit::ScratchDir scratch("hf-extract");
     const std::string in = scratch.File("in.bin"), out = scratch.File("out.bin");
-    for (const auto& c : cases)
+    for (const auto& c : testkit::Cases("engine/extract.txt", 7, 11))
     {
-        ASSERT_EQ(c.size(), 7u) << c[0];
         SCOPED_TRACE(c[0]);
         const std::string input = Pattern(std::stoul(c[1]));
         testkit::WriteFile(in, input);

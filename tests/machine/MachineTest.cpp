@@ -151,11 +151,8 @@ std::vector<std::string> List(wxArrayString folders = {})
 
 TEST_F(WarehouseTest, PathsOfTheTable)
 {
-    const auto cases = testkit::ReadCaseTable("machine/paths.txt");
-    ASSERT_FALSE(cases.empty());
-    for (const testkit::CaseFields& c : cases)
+    for (const testkit::CaseFields& c : testkit::Cases("machine/paths.txt", 4))
     {
-        ASSERT_EQ(c.size(), 4u);
         SCOPED_TRACE(c[0] + " | " + c[1]);
         wxString expected = Wx(c[2]);
         expected.Replace("$W", Wx(Warehouse()));
@@ -220,11 +217,8 @@ TEST_F(Preferences, ReadAndWrittenAgain)
     db::Preference full;
     WriteRaw(testkit::ReadFile(kData + "PreferencesFull.cfg"));
     ASSERT_EQ(HFDatabase::ReadPreferences(full), -1);
-    const auto cases = testkit::ReadCaseTable("machine/preferences-read.txt");
-    ASSERT_FALSE(cases.empty());
-    for (const testkit::CaseFields& c : cases)
+    for (const testkit::CaseFields& c : testkit::Cases("machine/preferences-read.txt", 5))
     {
-        ASSERT_EQ(c.size(), 5u);
         SCOPED_TRACE(c[0]);
         unlink(File().c_str());
         if (c[0] != "(missing)")

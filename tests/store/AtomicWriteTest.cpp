@@ -126,11 +126,8 @@ TEST(AtomicWrite, ReplacementKeepsPermissionsAndReplacesALinksTarget)
 
 TEST(AtomicWrite, FailureSaysWhyAndLeavesNoTemporaryFile)
 {
-    const auto cases = testkit::ReadCaseTable("store/atomic-write-failures.txt");
-    ASSERT_FALSE(cases.empty());
-    for (const testkit::CaseFields& c : cases)
+    for (const testkit::CaseFields& c : testkit::Cases("store/atomic-write-failures.txt", 3))
     {
-        ASSERT_EQ(c.size(), 3u);
         SCOPED_TRACE(c[0] + " | " + c[1]);
         testkit::ScratchDir dir;
         if (c[0].rfind("mkdir ", 0) == 0)

@@ -44,11 +44,8 @@ TEST(FolderFileFormat, WrittenFilesMatchTheReviewedOnesAndReadBackWhole)
 TEST(FolderFileFormat, ReadIntoAConfigurationAndWrittenAgain)
 {
     wxLogNull quiet; // the loader's error messages are expected here
-    const auto cases = testkit::ReadCaseTable("store/folder-read.txt");
-    ASSERT_FALSE(cases.empty());
-    for (const testkit::CaseFields& c : cases)
+    for (const testkit::CaseFields& c : testkit::Cases("store/folder-read.txt", 5))
     {
-        ASSERT_EQ(c.size(), 5u);
         SCOPED_TRACE(c[0] + " | " + c[1]);
         testkit::ScratchDir dir;
         const std::string path = c[0] == "(missing)"     ? dir.File("none.cfg")

@@ -110,11 +110,8 @@ protected:
 
 TEST(XmlHelper, CasesOfTheTable)
 {
-    const auto cases = testkit::ReadCaseTable("store/xml-helper.txt");
-    ASSERT_FALSE(cases.empty());
-    for (const testkit::CaseFields& c : cases)
+    for (const testkit::CaseFields& c : testkit::Cases("store/xml-helper.txt", 5))
     {
-        ASSERT_EQ(c.size(), 5u);
         SCOPED_TRACE(c[0] + " | " + c[1] + " | " + c[2]);
         auto document = Parse(c[1]);
         EXPECT_EQ(Apply(c[0], document->GetRoot(), c[2]), c[3]) << c[4];

@@ -6,6 +6,8 @@
 #include <string>
 #include <vector>
 
+#include <gtest/gtest.h>
+
 namespace testkit
 {
 using CaseFields = std::vector<std::string>;
@@ -31,6 +33,24 @@ inline std::vector<CaseFields> ReadCaseTable(const std::string& relativePath)
         }
         cases.push_back(fields);
     }
+    return cases;
+}
+
+// The cases of a table whose lines all have `fields` fields, for a driver
+// that needs at least `minimum` of them. A line with another count, or a
+// table with fewer cases, fails the test; such a line is left out.
+inline std::vector<CaseFields> Cases(const std::string& relativePath, size_t fields,
+                                     size_t minimum = 1)
+{
+    std::vector<CaseFields> cases;
+    for (CaseFields& c : ReadCaseTable(relativePath))
+        if (c.size() == fields)
+            cases.push_back(std::move(c));
+        else
+            ADD_FAILURE() << relativePath << ": " << c.size() << " fields, not " << fields << ": "
+                          << c[0];
+    if (cases.size() < minimum)
+        ADD_FAILURE() << relativePath << ": " << cases.size() << " cases, not at least " << minimum;
     return cases;
 }
 } // namespace testkit
