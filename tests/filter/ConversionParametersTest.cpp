@@ -12,19 +12,6 @@
 
 namespace
 {
-std::vector<std::string> Split(const std::string& text, const std::string& separator)
-{
-    std::vector<std::string> parts;
-    for (size_t start = 0;;)
-    {
-        const size_t at = text.find(separator, start);
-        parts.push_back(text.substr(start, at - start));
-        if (at == std::string::npos)
-            return parts;
-        start = at + separator.size();
-    }
-}
-
 // The value of a field of the loaded filter, as the table writes it.
 std::string Field(EPS& eps, const std::string& name)
 {
@@ -65,9 +52,9 @@ void RunTable(bool decimalComma)
         SCOPED_TRACE(c[0]);
         EPS eps("test");
         if (c[2] != "(none)")
-            for (const std::string& load : Split(c[2], " then "))
+            for (const std::string& load : testkit::Split(c[2], " then "))
             {
-                for (const std::string& setting : Split(load, "; "))
+                for (const std::string& setting : testkit::Split(load, "; "))
                     if (setting != "-")
                     {
                         const size_t equals = setting.find('=');
@@ -76,7 +63,7 @@ void RunTable(bool decimalComma)
                     }
                 eps.LoadEPSParams();
             }
-        for (const std::string& expected : Split(c[3], "; "))
+        for (const std::string& expected : testkit::Split(c[3], "; "))
         {
             const size_t equals = expected.find('=');
             EXPECT_EQ(Field(eps, expected.substr(0, equals)), expected.substr(equals + 1))

@@ -126,10 +126,7 @@ private:
     {
         for (const testkit::CaseFields& row : m_attributes)
         {
-            std::vector<std::string> values;
-            for (size_t start = 0, comma = 0; comma != std::string::npos; start = comma + 2)
-                values.push_back(
-                    row.at(2).substr(start, (comma = row[2].find(", ", start)) - start));
+            const std::vector<std::string> values = testkit::Split(row.at(2), ", ");
             const char* name = row[0].c_str();
             if (row[1] == "integer")
             {

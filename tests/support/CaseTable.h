@@ -12,6 +12,20 @@ namespace testkit
 {
 using CaseFields = std::vector<std::string>;
 
+// The parts of text between separators; text without one is one part.
+inline std::vector<std::string> Split(const std::string& text, const std::string& separator)
+{
+    std::vector<std::string> parts;
+    for (size_t start = 0;;)
+    {
+        const size_t at = text.find(separator, start);
+        parts.push_back(text.substr(start, at - start));
+        if (at == std::string::npos)
+            return parts;
+        start = at + separator.size();
+    }
+}
+
 // The cases of HF_TEST_DATA_DIR/relativePath; empty when the file is missing,
 // which the caller should treat as a failure.
 inline std::vector<CaseFields> ReadCaseTable(const std::string& relativePath)
@@ -22,16 +36,7 @@ inline std::vector<CaseFields> ReadCaseTable(const std::string& relativePath)
     {
         if (line.empty() || line[0] == '#')
             continue;
-        CaseFields fields;
-        for (size_t start = 0;;)
-        {
-            const size_t bar = line.find(" | ", start);
-            fields.push_back(line.substr(start, bar - start));
-            if (bar == std::string::npos)
-                break;
-            start = bar + 3;
-        }
-        cases.push_back(fields);
+        cases.push_back(Split(line, " | "));
     }
     return cases;
 }
