@@ -334,7 +334,14 @@ def main():
     results = []
     try:
         copy_tree(src)
-        env = dict(os.environ, CCACHE_BASEDIR=scratch, CCACHE_NOHASHDIR="1")
+        # A test a mutant crashes or hangs is killed before it can remove its
+        # scratch folders; they go with the harness's own.
+        # Searchable by all, as /tmp is: a store test reads its folder as
+        # the unprivileged user.
+        os.chmod(scratch, 0o755)
+        os.mkdir(os.path.join(scratch, "tmp"), 0o755)
+        env = dict(os.environ, CCACHE_BASEDIR=scratch, CCACHE_NOHASHDIR="1",
+                   TMPDIR=os.path.join(scratch, "tmp"))
         print(f"mutate: baseline build in {build}", flush=True)
         rc, _ = run(["cmake", "--preset", "default", "-S", src, "-B", build,
                      "-DHF_BUILD_BENCH=OFF"], src, 600, env)
