@@ -1,75 +1,63 @@
 // hotfolder run: the jobs waiting in a hot folder, once or while watching.
 #include <chrono>
-#include <map>
 #include <memory>
-#include <set>
-#include <thread>
 
 #include <wx/filename.h>
 
 #include "cli/CommandLine.h"
 #include "cli/CommandSupport.h"
 #include "cli/ConsoleText.h"
-#include "printing/CupsForwarding.h"
-#include "folder/FileMoves.h"
-#include "module/FilterSession.h"
-#include "folder/FolderWatcher.h"
-#include "folder/HotFolder.h"
-#include "jobs/JobRunner.h"
-#include "module/ModuleLocator.h"
 #include "cli/ProgressDisplay.h"
-#include "jobs/RunStatistics.h"
-#include "folder/ServerDescription.h"
-#include "jobs/StopRequest.h"
 #include "db/PathResolver.h"
+#include "folder/FileMoves.h"
+#include "folder/HotFolder.h"
+#include "folder/ServerDescription.h"
+#include "jobs/JobReport.h"
+#include "jobs/RunStatistics.h"
+#include "jobs/StopRequest.h"
+#include "module/ModuleLocator.h"
+#include "printing/CupsForwarding.h"
+#include "service/HotFolderService.h"
+#include "service/ServedFolder.h"
 
 static const char kRunUsage[] =
     "usage: hotfolder run FOLDER [--watch] [--out DIR] [--settle MS] [--stats]\n"
     "                     [--delay-jobs MS] [--submit cups:QUEUE] [--module PATH]\n"
     "\n"
     "Processes the files in the hot folder FOLDER with the filter and the\n"
-    "settings stored in it. Outputs and their job tickets (<output>.Folder.cfg)\n"
-    "go to DIR (default: FOLDER/Output), originals to the kept-originals folder,\n"
-    "failed originals to the failed folder with a line in its failed-jobs.log.\n"
-    "Files the filter refuses stay where they are.\n"
+    "settings stored in it, on the service's road: every file exactly once, even\n"
+    "when the run is killed (the next run or the service finishes its jobs), and\n"
+    "never a file some process still holds open for writing. Outputs and their\n"
+    "job tickets (<output>.Folder.cfg) go to DIR (default: FOLDER/Output),\n"
+    "originals to the kept-originals folder, failed originals to the failed\n"
+    "folder with a line in its failed-jobs.log. Files the filter refuses stay\n"
+    "where they are. A folder is worked by one process at a time: a folder the\n"
+    "service serves, or another run works, is left alone (exit status 3).\n"
     "\n"
-    "  --watch          keep running and take files as they arrive; a file is\n"
-    "                   taken once its size has not changed for --settle MS\n"
-    "                   (default 500). Stops on SIGINT, SIGTERM or the StopHF\n"
-    "                   marker in the warehouse.\n"
+    "  --watch          keep running and take files as they arrive: as soon as\n"
+    "                   their writer closes them, or once unchanged for --settle\n"
+    "                   MS (default 500) when no event tells. Stops on SIGINT,\n"
+    "                   SIGTERM or the StopHF marker in the warehouse.\n"
     "  --stats          print where the time went (inside and outside the filter)\n"
     "  --delay-jobs MS  wait between finding the jobs and processing them\n"
     "  --submit cups:QUEUE\n"
     "                   print every delivered output on the CUPS queue QUEUE\n"
     "                   (of the scheduler CUPS_SERVER or client.conf names), with\n"
-    "                   the job's overrides as options; a refused submission\n"
-    "                   counts as a failed job, its output stays delivered\n"
-    "                   (a folder bound by init --printer prints on its queue\n"
-    "                   without --submit)\n"
+    "                   the job's overrides as options; a queue that refuses the\n"
+    "                   job makes it \"not printed\", its output stays delivered;\n"
+    "                   a scheduler that cannot be reached holds the printing\n"
+    "                   until the next run or the service (a folder bound by\n"
+    "                   init --printer prints on its queue without --submit)\n"
     "\n"
-    "Exit status: 0 when every job succeeded, 1 when a job failed, 2 for a bad\n"
-    "command line, 3 when the folder, its configuration or the module is unusable.\n";
+    "Exit status: 0 when every job succeeded (and was sent to the printer, if\n"
+    "any), 1 when a job failed or was not printed, 2 for a bad command line, 3\n"
+    "when the folder, its configuration or the module is unusable, or another\n"
+    "process works the folder.\n";
 
 namespace
 {
-// One file as last seen, so a refused or stuck file is reported once and
-// looked at again only when it changes.
-struct Signature
-{
-    long long size = -1;
-    long long mtimeNs = -1;
-    bool operator==(const Signature& other) const
-    {
-        return size == other.size && mtimeNs == other.mtimeNs;
-    }
-};
-
-Signature SignatureOf(const wxString& path)
-{
-    Signature signature;
-    FileSignature(path, signature.size, signature.mtimeNs);
-    return signature;
-}
+// Files taken before the printing gets its turn, as in the service.
+const size_t kFilesPerTurn = 128;
 
 long ParseMilliseconds(const std::string& text, long fallback)
 {
@@ -78,81 +66,6 @@ long ParseMilliseconds(const std::string& text, long fallback)
     char* end = nullptr;
     long value = std::strtol(text.c_str(), &end, 10);
     return (*end == '\0' && value >= 0) ? value : -1;
-}
-
-class FolderRun
-{
-public:
-    FolderRun(FilterSession& session, const HotFolder& folder, const JobPlaces& places,
-              ProgressDisplay& progress, RunStatistics& statistics, long delayJobsMs)
-        : m_session(session), m_folder(folder), m_runner(session, places, progress, statistics),
-          m_progress(progress), m_statistics(statistics), m_delayJobsMs(delayJobsMs)
-    {
-    }
-
-    // Sniffs the given files and processes the jobs found. False when a stop
-    // was asked for before every job was done.
-    bool Pass(const std::vector<wxString>& candidates);
-
-    // Files not to offer again until they change.
-    bool IsSetAside(const wxString& path) const
-    {
-        auto it = m_setAside.find(path);
-        return it != m_setAside.end() && it->second == SignatureOf(path);
-    }
-
-private:
-    FilterSession& m_session;
-    const HotFolder& m_folder;
-    JobRunner m_runner;
-    ProgressDisplay& m_progress;
-    RunStatistics& m_statistics;
-    long m_delayJobsMs;
-    std::map<wxString, Signature> m_setAside;
-};
-
-bool FolderRun::Pass(const std::vector<wxString>& candidates)
-{
-    if (candidates.empty())
-        return true;
-    wxArrayString files;
-    for (const wxString& path : candidates)
-        files.Add(path);
-    wxArrayString rejected;
-    JobInfoCollection jobs;
-    {
-        ScopedSeconds timing(m_statistics.sniffSeconds);
-        m_session.SniffListed(m_folder.GetFolder(), files, rejected, jobs);
-    }
-    // Refused: everything offered that no job took, whether the filter
-    // listed it as rejected or silently passed it over.
-    std::set<wxString> taken;
-    for (size_t i = 0; i < jobs.size(); ++i)
-        for (const wxString& file : jobs[i].files)
-            taken.insert(file);
-    for (const wxString& path : candidates)
-        if (!taken.count(path))
-        {
-            ++m_statistics.refused;
-            m_setAside[path] = SignatureOf(path);
-            m_progress.Note("refused (left in place): " + path);
-        }
-    if (jobs.empty())
-        return true;
-    if (m_delayJobsMs > 0)
-    {
-        m_progress.Note(wxString::Format("found %zu job(s)", jobs.size()));
-        std::this_thread::sleep_for(std::chrono::milliseconds(m_delayJobsMs));
-    }
-    for (size_t i = 0; i < jobs.size(); ++i)
-    {
-        if (StopRequest::Requested())
-            return false;
-        if (m_runner.Run(jobs[i], i, jobs.size()) == JobOutcome::OriginalStuck)
-            for (const wxString& file : jobs[i].files)
-                m_setAside[file] = SignatureOf(file);
-    }
-    return true;
 }
 
 bool StopMarkerPresent()
@@ -173,13 +86,12 @@ struct RunRequest
     bool stats = false;
 };
 
-// The opened folder, the places its jobs go and the running filter.
+// The opened folder and the places its jobs go.
 struct RunSetup
 {
     HotFolder folder;
     ServerDescription server;
     JobPlaces places;
-    std::unique_ptr<FilterSession> session;
 };
 
 bool ParseRunRequest(const Arguments& args, RunRequest& request, int& status)
@@ -259,58 +171,38 @@ int PreparePlaces(const RunRequest& request, RunSetup& setup)
     return kExitSuccess;
 }
 
-// Opens the folder, makes its places and starts the filter. Returns the exit status.
+// Opens the folder and makes its places. Returns the exit status.
 int PrepareRun(const RunRequest& request, RunSetup& setup)
 {
     if (!OpenFolderAndServer(request.folder, setup.folder, setup.server))
         return kExitSetupFailed;
-    const int status = PreparePlaces(request, setup);
-    if (status != kExitSuccess)
-        return status;
-    wxString error;
-    const wxString modulePath = LocateFilterModule(FromUtf8(request.module));
-    setup.session = FilterSession::Start(modulePath, setup.server.GetText(),
-                                         &setup.folder.GetFilterSetting(), error);
-    if (!setup.session)
-    {
-        PrintError(error);
-        return kExitSetupFailed;
-    }
-    wxArrayString missing =
-        setup.server.MissingFeatures(setup.session->Info().m_arrRequiredServerFeatures);
-    if (!missing.empty())
-        PrintError("warning: the server description does not offer " + wxJoin(missing, ' ') +
-                   ", which the filter needs");
-    return kExitSuccess;
+    return PreparePlaces(request, setup);
 }
 
-// Takes files as they arrive until a stop is asked for. Returns the exit
-// status when the watch cannot start, otherwise kExitSuccess.
-int WatchFolder(const RunRequest& request, const HotFolder& folder, FolderRun& run,
-                ProgressDisplay& progress)
+// One pass over what waits in the folder: the service's road, once. False
+// when something delivered waits for the printer.
+int RunOnce(const FolderOptions& options, const wxString& path, JobReport& report,
+            RunStatistics& statistics, bool& printed)
 {
-    FolderWatcher watcher;
     wxString error;
-    if (!watcher.Watch(folder.GetFolder(), error))
+    std::unique_ptr<ServedFolder> folder = ServedFolder::Open(path, options, report, error);
+    if (!folder)
     {
         PrintError(error);
         return kExitSetupFailed;
     }
-    progress.Note("watching " + folder.GetFolder() + " (Ctrl-C to stop)");
-    SettleTracker settle{std::chrono::milliseconds(request.settleMs)};
-    while (!StopRequest::Requested() && !StopMarkerPresent())
-    {
-        std::vector<wxString> candidates;
-        for (const wxString& path : settle.Settled(ListFolderFiles(folder.GetFolder())))
-            if (!run.IsSetAside(path))
-                candidates.push_back(path);
-        if (!run.Pass(candidates))
-            break;
-        // Short ticks while files settle; inotify wakes us early.
-        watcher.Wait(std::max(50L, std::min(250L, request.settleMs / 2)));
-    }
-    progress.Note(StopRequest::Requested() ? "stop requested; stopped"
-                                           : "the StopHF marker appeared; stopped");
+    const auto stop = [] { return StopRequest::Requested(); };
+    // A file some process holds open for writing is left for later.
+    while (folder->HasOffers() && !stop())
+        folder->TakeOffered(kFilesPerTurn, stop);
+    folder->Print(stop);
+    statistics.Add(folder->Statistics());
+    const size_t waiting = folder->Printing().Outstanding();
+    printed = folder->Printing().Held().empty();
+    if (!printed)
+        report.Warning(wxString::Format("%zu output(s) wait for the printer; the service or the "
+                                        "next run sends them",
+                                        waiting));
     return kExitSuccess;
 }
 
@@ -318,24 +210,43 @@ int ExecuteRun(const RunRequest& request, RunSetup& setup)
 {
     StopRequest::Install();
     ProgressDisplay progress(StdoutIsTerminal());
+    ConsoleReport report(progress);
     RunStatistics statistics;
-    FolderRun run(*setup.session, setup.folder, setup.places, progress, statistics,
-                  request.delayJobsMs);
+    FolderOptions options;
+    options.modulePath = LocateFilterModule(FromUtf8(request.module));
+    options.settle = std::chrono::milliseconds(request.settleMs);
+    options.outputFolder = setup.places.outputFolder;
+    options.queue = request.cupsQueue;
+    options.delayJobsMs = request.delayJobsMs;
+    options.holder = FolderLock::Holder::Run;
+    bool printed = true;
     if (request.watch)
     {
-        const int status = WatchFolder(request, setup.folder, run, progress);
+        progress.Note("watching " + setup.folder.GetFolder() + " (Ctrl-C to stop)");
+        ServiceOptions service;
+        service.folder = options;
+        service.onlyFolder = setup.folder.GetFolder();
+        service.report = &report;
+        service.totals = &statistics;
+        const int status = RunHotFolderService(service);
         if (status != kExitSuccess)
             return status;
     }
     else if (StopMarkerPresent())
         progress.Note("the StopHF marker is present; nothing is processed");
     else
-        run.Pass(ListFolderFiles(setup.folder.GetFolder()));
+    {
+        const int status =
+            RunOnce(options, setup.folder.GetFolder(), report, statistics, printed);
+        if (status != kExitSuccess)
+            return status;
+    }
 
     statistics.PrintSummary();
     if (request.stats)
         statistics.PrintTiming();
-    return statistics.failed == 0 ? kExitSuccess : kExitJobsFailed;
+    return statistics.failed == 0 && statistics.notPrinted == 0 && printed ? kExitSuccess
+                                                                          : kExitJobsFailed;
 }
 } // namespace
 

@@ -2,6 +2,17 @@
 
 #include <cstdio>
 
+void RunStatistics::Add(const RunStatistics& other)
+{
+    done += other.done;
+    failed += other.failed;
+    refused += other.refused;
+    printed += other.printed;
+    notPrinted += other.notPrinted;
+    sniffSeconds += other.sniffSeconds;
+    processSeconds += other.processSeconds;
+}
+
 double RunStatistics::ElapsedSeconds() const
 {
     return std::chrono::duration<double>(std::chrono::steady_clock::now() - m_started).count();
@@ -11,8 +22,10 @@ double RunStatistics::ElapsedSeconds() const
 // they always carry ".".
 void RunStatistics::PrintSummary() const
 {
-    std::printf("Summary: %zu done, %zu failed, %zu refused in %.2f s\n", done, failed, refused,
-                ElapsedSeconds());
+    std::printf("Summary: %zu done, %zu failed, %zu refused", done, failed, refused);
+    if (notPrinted)
+        std::printf(", %zu not printed", notPrinted);
+    std::printf(" in %.2f s\n", ElapsedSeconds());
     std::fflush(stdout);
 }
 

@@ -11,9 +11,13 @@ public:
     size_t done = 0;
     size_t failed = 0;
     size_t refused = 0;
+    size_t printed = 0;    // jobs the printer completed
+    size_t notPrinted = 0; // delivered, but the printer refused, aborted or cancelled them
     double sniffSeconds = 0;   // inside SniffFolder
     double processSeconds = 0; // inside Process
 
+    // Adds the counts and times of another run (not its start).
+    void Add(const RunStatistics& other);
     double ElapsedSeconds() const;
     // "3 done, 1 failed, 2 refused in 1.23 s"
     void PrintSummary() const;

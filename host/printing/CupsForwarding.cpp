@@ -7,7 +7,7 @@
 #include "db/ConfigurationReader.h"
 #include "db/JobConfiguration.h"
 
-#include "CupsSubmission.h"
+#include "CupsJobOptions.h"
 
 static const char kCupsPrefix[] = "cups:";
 
@@ -36,19 +36,12 @@ bool ParseSubmitTarget(const std::string& text, std::string& queue, wxString& er
     return true;
 }
 
-bool SubmitDeliveredOutput(const std::string& queue, const wxString& output, const wxString& ticket,
-                           const wxString& jobName, int& jobId, wxString& error)
+std::vector<std::pair<std::string, std::string>> TicketOptions(const wxString& ticket)
 {
-    // The ticket holds the overrides the filter chose for this job (its
-    // paper above all), which the queue must apply too.
     db::JobConfiguration overrides;
     db::ConfigurationReader::ReadJobConfiguration(ticket, overrides);
     std::vector<std::pair<std::string, std::string>> options;
     for (const auto& entry : overrides.GetProperties())
         options.emplace_back(ToUtf8(entry.first), ToUtf8(entry.second.GetValue()));
-    std::string reason;
-    if (printing::SubmitToCups(queue, ToUtf8(output), ToUtf8(jobName), options, reason, &jobId))
-        return true;
-    error = FromUtf8(reason);
-    return false;
+    return printing::CupsOptionsFromOverrides(options);
 }

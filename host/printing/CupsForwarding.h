@@ -1,5 +1,7 @@
 #pragma once
 #include <string>
+#include <utility>
+#include <vector>
 
 #include <wx/string.h>
 
@@ -9,8 +11,6 @@
 // form or names no queue.
 bool ParseSubmitTarget(const std::string& text, std::string& queue, wxString& error);
 
-// Submits the delivered PostScript file to queue under jobName, with the job
-// overrides the filter merged into the job's ticket as options. jobId gets
-// the scheduler's job number; false with the scheduler's reason otherwise.
-bool SubmitDeliveredOutput(const std::string& queue, const wxString& output, const wxString& ticket,
-                           const wxString& jobName, int& jobId, wxString& error);
+// The job options of a delivered output: the overrides the filter merged
+// into its ticket (its paper above all), which the queue must apply too.
+std::vector<std::pair<std::string, std::string>> TicketOptions(const wxString& ticket);

@@ -15,7 +15,7 @@
 #include "cli/ConsoleText.h"
 #include "folder/FolderWatcher.h"
 #include "folder/HotFolder.h"
-#include "jobs/JobRunner.h"
+#include "jobs/JobPlaces.h"
 #include "module/FilterSettings.h"
 
 namespace
@@ -79,7 +79,7 @@ void CountKept(const wxString& directory, FolderStatus& status)
 void CountFailed(const wxString& directory, FolderStatus& status)
 {
     std::ifstream log(
-        std::string(wxFileName(directory, JobRunner::kFailureLogName).GetFullPath().fn_str()));
+        std::string(wxFileName(directory, kFailureLogName).GetFullPath().fn_str()));
     const std::string today = ToUtf8(wxDateTime::Now().FormatISODate());
     std::string line, last;
     while (std::getline(log, line))

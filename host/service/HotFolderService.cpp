@@ -21,7 +21,7 @@
 #include "service/HotFolderListEntries.h"
 #include "service/ServedFolder.h"
 #include "service/ServiceLock.h"
-#include "service/ServiceLog.h"
+#include "jobs/JobReport.h"
 
 namespace
 {
@@ -48,7 +48,10 @@ bool Exists(const wxString& path)
 class Service
 {
 public:
-    explicit Service(const ServiceOptions& options) : m_options(options) {}
+    explicit Service(const ServiceOptions& options)
+        : m_options(options), m_report(options.report ? *options.report : m_serviceReport)
+    {
+    }
     ~Service()
     {
         if (m_inotify >= 0)
@@ -66,15 +69,25 @@ private:
         wxString problem; // why it is not served; empty while it is
     };
 
-    bool StopWanted() const { return m_stop || StopRequest::Requested() || !Exists(m_marker); }
+    bool StopWanted() const
+    {
+        return m_stop || StopRequest::Requested() || (!Single() && !Exists(m_marker));
+    }
     void SyncList();
     void Serve(const wxString& path, Entry& entry);
     void Drop(Entry& entry, const wxString& problem);
     void DrainEvents();
     void Wait(int timeoutMs);
     void PrintStatistics() const;
+    RunStatistics Totals() const;
+    bool Single() const { return !m_options.onlyFolder.empty(); }
+    // Sends and follows every folder's printing; true while some job is out.
+    bool Print();
 
     ServiceOptions m_options;
+    ServiceReport m_serviceReport;
+    JobReport& m_report;
+    int m_status = kExitSuccess;
     wxString m_warehouse;
     wxString m_marker;
     int m_inotify = -1;
@@ -94,11 +107,7 @@ void Service::Drop(Entry& entry, const wxString& problem)
 {
     if (entry.folder)
     {
-        RunStatistics& statistics = entry.folder->Statistics();
-        m_ended.done += statistics.done;
-        m_ended.failed += statistics.failed;
-        m_ended.refused += statistics.refused;
-        m_ended.processSeconds += statistics.processSeconds;
+        m_ended.Add(entry.folder->Statistics());
     }
     entry.folder.reset();
     if (entry.watch >= 0)
@@ -132,7 +141,7 @@ void Service::Serve(const wxString& path, Entry& entry)
     {
         m_byWatch[watch] = path;
         entry.watch = watch;
-        entry.folder = ServedFolder::Open(path, m_options.modulePath, m_options.settle, problem);
+        entry.folder = ServedFolder::Open(path, m_options.folder, m_report, problem);
         if (entry.folder)
         {
             // Settings changed while serving apply from the next job on.
@@ -142,26 +151,35 @@ void Service::Serve(const wxString& path, Entry& entry)
             if (entry.configWatch >= 0)
                 m_byConfigWatch[entry.configWatch] = path;
             entry.problem.clear();
-            ServiceLog(Severity::Info, "serving " + path);
+            if (!Single())
+                m_report.Info("serving " + path);
             return;
         }
     }
+    if (Single())
+    {
+        // A run has nothing else to serve: it ends here.
+        m_report.Error(problem);
+        m_status = kExitSetupFailed;
+        m_stop = true;
+    }
     // Reported once for each new reason, not on every retry.
-    if (entry.problem != problem)
-        ServiceLog(Severity::Error, "cannot serve " + path + ": " + problem);
+    else if (entry.problem != problem)
+        m_report.Error("cannot serve " + path + ": " + problem);
     Drop(entry, problem);
 }
 
 void Service::SyncList()
 {
     m_listChanged = false;
-    const std::vector<wxString> listed = ReadHotFolderListEntries();
+    const std::vector<wxString> listed =
+        Single() ? std::vector<wxString>{m_options.onlyFolder} : ReadHotFolderListEntries();
     for (auto it = m_entries.begin(); it != m_entries.end();)
     {
         if (std::find(listed.begin(), listed.end(), it->first) == listed.end())
         {
             if (it->second.folder)
-                ServiceLog(Severity::Info, "no longer serving " + it->first);
+                m_report.Info("no longer serving " + it->first);
             Drop(it->second, wxString());
             it = m_entries.erase(it);
         }
@@ -173,7 +191,7 @@ void Service::SyncList()
         Entry& entry = m_entries[path];
         if (entry.reload)
         {
-            ServiceLog(Severity::Info, "the settings of " + path + " changed; reading them again");
+            m_report.Info("the settings of " + path + " changed; reading them again");
             Drop(entry, wxString());
             entry.reload = false;
         }
@@ -229,7 +247,7 @@ void Service::DrainEvents()
             Entry& entry = m_entries[watched->second];
             if (event->mask & (IN_DELETE_SELF | IN_MOVE_SELF | IN_IGNORED))
             {
-                ServiceLog(Severity::Error, watched->second + " vanished; it is no longer served");
+                m_report.Error(watched->second + " vanished; it is no longer served");
                 Drop(entry, "the folder vanished");
                 continue;
             }
@@ -245,18 +263,31 @@ void Service::Wait(int timeoutMs)
     poll(fds, fds[1].fd >= 0 ? 2 : 1, timeoutMs);
 }
 
-void Service::PrintStatistics() const
+RunStatistics Service::Totals() const
 {
     RunStatistics total = m_ended;
     for (const auto& served : m_entries)
         if (served.second.folder)
+            total.Add(served.second.folder->Statistics());
+    return total;
+}
+
+bool Service::Print()
+{
+    bool out = false;
+    const auto stop = [this] { return StopWanted(); };
+    for (auto& served : m_entries)
+        if (served.second.folder)
         {
-            const RunStatistics& statistics = served.second.folder->Statistics();
-            total.done += statistics.done;
-            total.failed += statistics.failed;
-            total.refused += statistics.refused;
-            total.processSeconds += statistics.processSeconds;
+            served.second.folder->Print(stop);
+            out = out || served.second.folder->Printing().Following();
         }
+    return out;
+}
+
+void Service::PrintStatistics() const
+{
+    const RunStatistics total = Totals();
     const double outside = std::max(0.0, m_busySeconds - total.processSeconds);
     std::printf("Summary: %zu done, %zu failed, %zu refused\n", total.done, total.failed,
                 total.refused);
@@ -271,42 +302,50 @@ void Service::PrintStatistics() const
 int Service::Run()
 {
     wxString error;
-    m_warehouse = db::PathResolver::GetWarehousePath();
-    if (!MakeDirectories(m_warehouse, error))
-    {
-        ServiceLog(Severity::Error, error);
-        return kExitSetupFailed;
-    }
-    m_marker = db::PathResolver::GetRunServiceFileName();
     ServiceLock lock;
-    if (!lock.Acquire(error))
-    {
-        ServiceLog(Severity::Error, error);
-        return kExitSetupFailed;
-    }
-    db::PathResolver::CreateRunServiceFile();
-    StopRequest::Install();
-
     m_inotify = inotify_init1(IN_NONBLOCK | IN_CLOEXEC);
-    if (m_inotify >= 0)
+    if (!Single())
     {
-        m_warehouseWatch = inotify_add_watch(m_inotify, m_warehouse.fn_str(),
-                                             IN_CLOSE_WRITE | IN_MOVED_TO | IN_CREATE);
-        m_serviceWatch =
-            inotify_add_watch(m_inotify, wxFileName(m_marker).GetPath().fn_str(),
-                              IN_DELETE | IN_MOVED_FROM | IN_DELETE_SELF | IN_MOVE_SELF);
+        m_warehouse = db::PathResolver::GetWarehousePath();
+        if (!MakeDirectories(m_warehouse, error))
+        {
+            m_report.Error(error);
+            return kExitSetupFailed;
+        }
+        m_marker = db::PathResolver::GetRunServiceFileName();
+        if (!lock.Acquire(error))
+        {
+            m_report.Error(error);
+            return kExitSetupFailed;
+        }
+        db::PathResolver::CreateRunServiceFile();
+        if (m_inotify >= 0)
+        {
+            m_warehouseWatch = inotify_add_watch(m_inotify, m_warehouse.fn_str(),
+                                                 IN_CLOSE_WRITE | IN_MOVED_TO | IN_CREATE);
+            m_serviceWatch =
+                inotify_add_watch(m_inotify, wxFileName(m_marker).GetPath().fn_str(),
+                                  IN_DELETE | IN_MOVED_FROM | IN_DELETE_SELF | IN_MOVE_SELF);
+        }
+        if (m_inotify < 0 || m_warehouseWatch < 0 || m_serviceWatch < 0)
+        {
+            m_report.Error("cannot watch " + m_warehouse + ": " +
+                           wxString::FromUTF8(std::strerror(errno)));
+            return kExitSetupFailed;
+        }
+        m_report.Info("the hot-folder service starts; the list is " + HotFolderListFile());
     }
-    if (m_inotify < 0 || m_warehouseWatch < 0 || m_serviceWatch < 0)
+    else if (m_inotify < 0)
     {
-        ServiceLog(Severity::Error,
-                   "cannot watch " + m_warehouse + ": " + wxString::FromUTF8(std::strerror(errno)));
+        m_report.Error("cannot watch " + m_options.onlyFolder + ": " +
+                       wxString::FromUTF8(std::strerror(errno)));
         return kExitSetupFailed;
     }
-    ServiceLog(Severity::Info, "the hot-folder service starts; the list is " + HotFolderListFile());
+    StopRequest::Install();
 
     const wxString stopMarker = db::PathResolver::GetStopAllHFFilePath().GetFullPath();
     const int tickMs =
-        static_cast<int>(std::clamp<long long>(m_options.settle.count() / 2, 50, 1000));
+        static_cast<int>(std::clamp<long long>(m_options.folder.settle.count() / 2, 50, 1000));
     auto nextRescan = Clock::now();
     bool paused = false;
     const auto stop = [this] { return StopWanted(); };
@@ -318,18 +357,25 @@ int Service::Run()
             reload = reload || served.second.reload;
         if (m_listChanged || reload || started >= m_nextRetry)
             SyncList();
+        if (StopWanted())
+            break;
         const bool stopMarkerPresent = Exists(stopMarker);
+        if (Single() && stopMarkerPresent)
+        {
+            m_report.Info("the StopHF marker appeared; stopped");
+            break;
+        }
         if (stopMarkerPresent != paused)
         {
             paused = stopMarkerPresent;
-            ServiceLog(Severity::Info, paused ? "the StopHF marker is present; paused"
-                                              : "the StopHF marker is gone; resumed");
+            m_report.Info(paused ? "the StopHF marker is present; paused"
+                                 : "the StopHF marker is gone; resumed");
             if (!paused)
                 for (auto& served : m_entries)
                     if (served.second.folder)
                         served.second.folder->OfferAll();
         }
-        bool offers = false;
+        bool offers = false, printing = false;
         if (!paused)
         {
             if (started >= nextRescan)
@@ -337,14 +383,14 @@ int Service::Run()
                 for (auto& served : m_entries)
                     if (served.second.folder && !served.second.folder->Rescan())
                     {
-                        ServiceLog(Severity::Error,
-                                   served.first + " vanished; it is no longer served");
+                        m_report.Error(served.first + " vanished; it is no longer served");
                         Drop(served.second, "the folder vanished");
                     }
                 nextRescan = started + std::chrono::milliseconds(tickMs);
             }
             // Each folder in turn, a batch at a time, events read in between
-            // so a burst cannot overflow the queue.
+            // so a burst cannot overflow the queue; each batch delivered is
+            // sent to the printer at once.
             for (auto& served : m_entries)
             {
                 if (StopWanted())
@@ -352,25 +398,32 @@ int Service::Run()
                 if (served.second.folder && served.second.folder->HasOffers())
                 {
                     served.second.folder->TakeOffered(kBatch, stop);
+                    served.second.folder->Print(stop);
                     DrainEvents();
                     offers = offers || (served.second.folder && served.second.folder->HasOffers());
                 }
             }
+            printing = Print();
         }
         DrainEvents();
         m_busySeconds += std::chrono::duration<double>(Clock::now() - started).count();
         if (!offers)
         {
-            Wait(tickMs);
+            // Jobs at the printer are asked after more often than files settle.
+            Wait(printing ? std::min(tickMs, 100) : tickMs);
             DrainEvents();
         }
     }
-    ServiceLog(Severity::Info, StopRequest::Requested()
-                                   ? "stop requested; the service ends"
-                                   : "RunService was removed; the service ends");
+    if (!Single())
+        m_report.Info(StopRequest::Requested() ? "stop requested; the service ends"
+                                               : "RunService was removed; the service ends");
+    else if (StopRequest::Requested())
+        m_report.Info("stop requested; stopped");
     if (m_options.stats)
         PrintStatistics();
-    return kExitSuccess;
+    if (m_options.totals)
+        m_options.totals->Add(Totals());
+    return m_status;
 }
 } // namespace
 

@@ -3,11 +3,21 @@
 
 #include <wx/string.h>
 
+#include "service/ServedFolder.h"
+
+class JobReport;
+class RunStatistics;
+
 struct ServiceOptions
 {
-    wxString modulePath;
-    std::chrono::milliseconds settle{500};
-    bool stats = false; // print where the time went when it ends
+    FolderOptions folder;  // how each folder is worked
+    bool stats = false;    // print where the time went when it ends
+    // One folder instead of the machine-wide list ("hotfolder run --watch"):
+    // no service lock or RunService marker, and the StopHF marker ends the
+    // loop instead of pausing it.
+    wxString onlyFolder;
+    JobReport* report = nullptr;  // where messages go; the service log when null
+    RunStatistics* totals = nullptr; // receives the counts of every folder at the end
 };
 
 // Serves every folder of the machine-wide hot-folder list from one process

@@ -1,6 +1,7 @@
 #include "service/ServedFolder.h"
 
 #include <sys/stat.h>
+#include <thread>
 
 #include <wx/filename.h>
 
@@ -9,14 +10,18 @@
 #include "folder/ServerDescription.h"
 #include "module/FilterSession.h"
 #include "service/OpenWriters.h"
-#include "service/ServiceLog.h"
+#include "jobs/JobReport.h"
 
-std::unique_ptr<ServedFolder> ServedFolder::Open(const wxString& path, const wxString& modulePath,
-                                                 std::chrono::milliseconds settle, wxString& error)
+std::unique_ptr<ServedFolder> ServedFolder::Open(const wxString& path, const FolderOptions& options,
+                                                 JobReport& report, wxString& error)
 {
-    std::unique_ptr<ServedFolder> served(new ServedFolder(settle));
+    std::unique_ptr<ServedFolder> served(new ServedFolder(options, report));
     HotFolder& folder = served->m_folder;
     if (!folder.Open(path, error))
+        return nullptr;
+    const wxString container = db::PathResolver::GetContainerFolderPath(folder.GetFolder());
+    // Before anything in the folder is touched: one process at a time.
+    if (!served->m_lock.Acquire(container, options.holder, error))
         return nullptr;
     ServerDescription server;
     if (wxFileName::FileExists(folder.GetServerDescriptionFile()) &&
@@ -28,26 +33,30 @@ std::unique_ptr<ServedFolder> ServedFolder::Open(const wxString& path, const wxS
     places.workFolder = folder.GetWorkFolder();
     places.failedFolder = folder.GetFailedFolder();
     places.keptFolder = folder.GetKeptOriginalsFolder();
-    places.outputFolder = folder.GetDefaultOutputFolder();
+    places.outputFolder =
+        options.outputFolder.empty() ? folder.GetDefaultOutputFolder() : options.outputFolder;
+    places.cupsQueue = options.queue.empty() ? folder.GetBoundQueue() : options.queue;
     for (const wxString& directory :
          {places.outputFolder, places.workFolder, places.failedFolder, places.keptFolder})
         if (!EnsureWritableDirectory(directory, error))
             return nullptr;
 
-    served->m_session =
-        FilterSession::Start(modulePath, server.GetText(), &folder.GetFilterSetting(), error);
+    served->m_session = FilterSession::Start(options.modulePath, server.GetText(),
+                                             &folder.GetFilterSetting(), error);
     if (!served->m_session)
         return nullptr;
     const wxArrayString missing =
         server.MissingFeatures(served->m_session->Info().m_arrRequiredServerFeatures);
     if (!missing.empty())
-        ServiceLog(Severity::Warning, path + ": the server description does not offer " +
-                                          wxJoin(missing, ' ') + ", which the filter needs");
-    if (!served->m_journal.Open(db::PathResolver::GetContainerFolderPath(folder.GetFolder()),
-                                error))
+        report.Warning(path + ": the server description does not offer " + wxJoin(missing, ' ') +
+                       ", which the filter needs");
+    if (!served->m_journal.Open(container, error))
         return nullptr;
     served->m_jobs.reset(new ServiceJobs(*served->m_session, places, folder.GetFolder(),
-                                         served->m_journal, served->m_statistics));
+                                         served->m_journal, served->m_statistics, report));
+    served->m_printing.reset(new FolderPrinting(served->m_journal, container, places.failedFolder,
+                                                report, served->m_statistics));
+    // Deliveries first: an output recorded for printing is then in place.
     served->m_jobs->Recover();
     // What waits already is taken as if it had just arrived.
     served->OfferAll();
@@ -96,6 +105,12 @@ size_t ServedFolder::TakeOffered(size_t limit, const std::function<bool()>& stop
     return run;
 }
 
+void ServedFolder::Print(const std::function<bool()>& stop)
+{
+    m_printing->Submit(stop);
+    m_printing->Follow();
+}
+
 size_t ServedFolder::TakeBatch(size_t limit, const std::function<bool()>& stop)
 {
     // Regular, visible files only: a FIFO or a device is never opened.
@@ -142,8 +157,13 @@ size_t ServedFolder::TakeBatch(size_t limit, const std::function<bool()>& stop)
         {
             ++m_statistics.refused;
             SetAside(candidate.second);
-            ServiceLog(Severity::Warning, "refused (left in place): " + candidate.second);
+            m_report.Refused(candidate.second);
         }
+    if (!jobs.empty() && m_options.delayJobsMs > 0)
+    {
+        m_report.Info(wxString::Format("found %zu job(s)", jobs.size()));
+        std::this_thread::sleep_for(std::chrono::milliseconds(m_options.delayJobsMs));
+    }
     size_t run = 0;
     for (size_t i = 0; i < jobs.size(); ++i)
     {
@@ -156,6 +176,7 @@ size_t ServedFolder::TakeBatch(size_t limit, const std::function<bool()>& stop)
             break;
         }
         ++run;
+        m_report.Begin(i, jobs.size(), jobs[i].jobName);
         if (m_jobs->Run(jobs[i]) == JobOutcome::OriginalStuck)
             for (const wxString& file : jobs[i].files)
                 SetAside(file);

@@ -4,29 +4,46 @@
 #include <map>
 #include <memory>
 #include <set>
+#include <string>
 
 #include <wx/string.h>
 
 #include "folder/FolderWatcher.h"
 #include "folder/HotFolder.h"
-#include "jobs/JobRunner.h"
+#include "jobs/JobPlaces.h"
 #include "jobs/RunStatistics.h"
-#include "service/FolderJournal.h"
 #include "module/FilterSession.h"
+#include "service/FolderJournal.h"
+#include "service/FolderLock.h"
+#include "service/FolderPrinting.h"
 #include "service/ServiceJobs.h"
 
-// One hot folder of the service, with its own Folder.cfg, server
-// description, filter object and journal. Files are offered to it by name as
-// events report them; it takes them once no process holds them open for
-// writing. Files that change without events are found by a rescan and taken
-// once they have stayed unchanged for the settle time.
+class JobReport;
+
+// How a folder is worked: by the service, or by "hotfolder run" with its
+// command-line choices.
+struct FolderOptions
+{
+    wxString modulePath;
+    std::chrono::milliseconds settle{500};
+    wxString outputFolder; // empty: the folder's own output folder
+    std::string queue;     // empty: the queue the folder is bound to, if any
+    long delayJobsMs = 0;  // a pause between sniffing and processing (tests)
+    FolderLock::Holder holder = FolderLock::Holder::Service;
+};
+
+// One hot folder worked by one process, with its own Folder.cfg, server
+// description, filter object, journal and printing. Files are offered to it
+// by name as events report them; it takes them once no process holds them
+// open for writing. Files that change without events are found by a rescan
+// and taken once they have stayed unchanged for the settle time.
 class ServedFolder
 {
 public:
-    // Opens the folder and finishes what an earlier service left in its work
-    // folder. Null with a reason when the folder cannot be served.
-    static std::unique_ptr<ServedFolder> Open(const wxString& path, const wxString& modulePath,
-                                              std::chrono::milliseconds settle, wxString& error);
+    // Locks the folder, opens it and finishes what an earlier process left
+    // in its work folder. Null with a reason when it cannot be worked.
+    static std::unique_ptr<ServedFolder> Open(const wxString& path, const FolderOptions& options,
+                                              JobReport& report, wxString& error);
     ~ServedFolder();
 
     const wxString& Path() const { return m_folder.GetFolder(); }
@@ -44,19 +61,29 @@ public:
     // Takes up to limit offered files through the filter; stop is asked
     // between jobs. Returns the number of jobs run.
     size_t TakeOffered(size_t limit, const std::function<bool()>& stop);
+    // Sends delivered outputs to the printer and follows the jobs sent.
+    void Print(const std::function<bool()>& stop);
+    FolderPrinting& Printing() { return *m_printing; }
 
 private:
     size_t TakeBatch(size_t limit, const std::function<bool()>& stop);
-    ServedFolder(std::chrono::milliseconds settle) : m_settle(settle) {}
+    ServedFolder(const FolderOptions& options, JobReport& report)
+        : m_options(options), m_report(report), m_settle(options.settle)
+    {
+    }
     bool IsSetAside(const wxString& path) const;
     void SetAside(const wxString& path);
 
+    FolderOptions m_options;
+    JobReport& m_report;
+    FolderLock m_lock;
     HotFolder m_folder;
     JobPlaces m_places;
     std::unique_ptr<FilterSession> m_session;
     FolderJournal m_journal;
     RunStatistics m_statistics;
     std::unique_ptr<ServiceJobs> m_jobs;
+    std::unique_ptr<FolderPrinting> m_printing;
     SettleTracker m_settle;
     std::set<wxString> m_offered;
     // Refused files and stuck originals, by their size and time when seen,

@@ -74,8 +74,8 @@ int RunServeCommand(const Arguments& args)
         return kExitUsage;
     }
     ServiceOptions options;
-    options.modulePath = LocateFilterModule(FromUtf8(parsed.Get("--module")));
-    options.settle = std::chrono::milliseconds(settle);
+    options.folder.modulePath = LocateFilterModule(FromUtf8(parsed.Get("--module")));
+    options.folder.settle = std::chrono::milliseconds(settle);
     options.stats = parsed.Has("--stats");
     return RunHotFolderService(options);
 }

@@ -19,7 +19,8 @@
 #include "jobs/RunStatistics.h"
 #include "module/FilterSession.h"
 #include "service/FolderJournal.h"
-#include "service/ServiceLog.h"
+#include "jobs/JobReport.h"
+#include "service/FailureLog.h"
 
 namespace
 {
@@ -161,9 +162,8 @@ JobOutcome ServiceJobs::Run(const ReadyToProcessJobInfo& job)
     const wxString work = WorkDirectory(id);
     if (!MakeWorkDirectory(id))
     {
-        ServiceLog(Severity::Error,
-                   wxString::Format("%s: cannot make a work directory in %s: %s", job.jobName,
-                                    m_places.workFolder, Reason(errno)));
+        m_report.Error(wxString::Format("%s: cannot make a work directory in %s: %s",
+                                        job.jobName, m_places.workFolder, Reason(errno)));
         RemoveTree(work);
         return JobOutcome::OriginalStuck;
     }
@@ -177,13 +177,15 @@ JobOutcome ServiceJobs::Run(const ReadyToProcessJobInfo& job)
         if (RenameNoReplace(file, target) == 0)
             claimed.files.Add(target);
         else if (errno == ENOENT)
-            ServiceLog(Severity::Warning, file + " vanished before it was taken");
+        {
+            ++m_statistics.failed;
+            m_report.Error(file + " vanished between sniffing and processing");
+        }
         else if (errno == EXDEV &&
                  MoveIntoDirectory(file, OriginalsDirectory(id), name, moved, error))
             claimed.files.Add(moved);
         else
-            ServiceLog(Severity::Error,
-                       "cannot take " + file + ": " + (error.empty() ? Reason(errno) : error));
+            m_report.Error("cannot take " + file + ": " + (error.empty() ? Reason(errno) : error));
     }
     if (claimed.files.empty())
     {
@@ -262,7 +264,7 @@ JobOutcome ServiceJobs::Continue(const wxString& id, ReadyToProcessJobInfo job)
     const wxString workConfig = wxFileName(work, "Folder.cfg").GetFullPath();
     if (!CopyFileTo(m_places.configFile, workConfig, error))
         return Fail(id, job.jobName, error);
-    JobOutput output = ProcessJob(m_session.Filter(), job, work, nullptr);
+    JobOutput output = ProcessJob(m_session.Filter(), job, work, m_report.Progress());
     m_statistics.processSeconds += output.processSeconds;
     if (output.status != 0 || output.producedPath.empty())
     {
@@ -288,7 +290,7 @@ JobOutcome ServiceJobs::Continue(const wxString& id, ReadyToProcessJobInfo job)
         bool chosen = false;
         for (const Staged& staged : m_staged)
             chosen = chosen || staged.name == candidate;
-        if (!chosen && !Exists(target) && !Exists(target + JobRunner::kTicketSuffix))
+        if (!chosen && !Exists(target) && !Exists(target + kTicketSuffix))
             name = candidate;
     }
     if (name.empty())
@@ -321,10 +323,11 @@ void ServiceJobs::Commit()
         for (const Staged& staged : batch)
             for (const char* what : {"ticket", "output"})
                 SyncPath(StagedPath(staged.id, what));
-    std::vector<std::pair<wxString, wxString>> records;
+    std::vector<FolderJournal::Record> records;
     for (const Staged& staged : batch)
-        records.emplace_back(staged.id, staged.name);
-    if (!m_journal.RecordDeliveries(records))
+        for (auto& record : DeliveryRecords(staged.id, staged.name, staged.jobName))
+            records.push_back(std::move(record));
+    if (!m_journal.Append(records))
     {
         for (const Staged& staged : batch)
         {
@@ -362,7 +365,7 @@ bool ServiceJobs::Place(const wxString& id, wxString& name, const wxString& jobN
         }
         // Someone else took the name since it was chosen: the next one, recorded first.
         name = NumberedName(name, 2);
-        if (!m_journal.RecordDeliveries({{id, name}}))
+        if (!m_journal.Append(DeliveryRecords(id, name, jobName)))
         {
             Fail(id, jobName, "cannot record the delivery in the journal");
             return false;
@@ -371,8 +374,8 @@ bool ServiceJobs::Place(const wxString& id, wxString& name, const wxString& jobN
     const wxString ticket = StagedPath(id, "ticket");
     wxString placedTicket, error;
     if (Exists(ticket) && !MoveIntoDirectory(ticket, m_places.outputFolder,
-                                             name + JobRunner::kTicketSuffix, placedTicket, error))
-        ServiceLog(Severity::Warning, jobName + ": the job ticket stays at " + ticket);
+                                             name + kTicketSuffix, placedTicket, error))
+        m_report.Warning(jobName + ": the job ticket stays at " + ticket);
     return true;
 }
 
@@ -396,40 +399,35 @@ JobOutcome ServiceJobs::KeepOriginals(const wxString& id, const wxString& result
                                error))
         {
             ++m_statistics.failed;
-            ServiceLog(Severity::Error,
-                       result + "; the original stays in the work folder: " + error);
+            m_report.Error(result + "; the original stays in the work folder: " + error);
             return JobOutcome::OriginalStuck;
         }
     }
     Retire(id);
+    m_journal.ForgetDelivery(id);
     ++m_statistics.done;
-    ServiceLog(Severity::Info, result);
-    if (m_journal.Large())
-    {
-        bool inHand = false;
-        for (const wxString& name : EntryNames(m_places.workFolder))
-            inHand = inHand || name.StartsWith(kJobPrefix);
-        if (!inHand)
-            m_journal.Clear();
-    }
+    m_report.Done(result);
+    m_journal.CompactIfLarge();
     return JobOutcome::Done;
 }
 
 JobOutcome ServiceJobs::Fail(const wxString& id, const wxString& jobName, const wxString& reason)
 {
     ++m_statistics.failed;
-    LogFailure(jobName, reason);
+    AppendFailureLine(m_places.failedFolder, jobName, reason, m_report);
+    // Recorded as to be printed, it never was delivered: the printing forgets it.
+    if (m_journal.PrintOf(id))
+        m_journal.Append({FolderJournal::Dropped(id)});
     JobOutcome outcome = JobOutcome::Failed;
     for (const wxString& file : Originals(id))
     {
         wxString moved, error;
         if (MoveIntoDirectory(file, m_places.failedFolder, wxFileName(file).GetFullName(), moved,
                               error))
-            ServiceLog(Severity::Error, jobName + ": failed: " + reason + "; moved to " + moved);
+            m_report.Failed(jobName, reason, "moved to " + moved);
         else
         {
-            ServiceLog(Severity::Error, jobName + ": failed: " + reason +
-                                            "; the original stays in the work folder: " + error);
+            m_report.Failed(jobName, reason, "the original stays in the work folder: " + error);
             outcome = JobOutcome::OriginalStuck;
         }
     }
@@ -437,25 +435,25 @@ JobOutcome ServiceJobs::Fail(const wxString& id, const wxString& jobName, const 
     {
         RemoveStaged(id);
         Retire(id);
+        m_journal.ForgetDelivery(id);
     }
     return outcome;
 }
 
-void ServiceJobs::LogFailure(const wxString& name, const wxString& reason)
+std::vector<FolderJournal::Record>
+ServiceJobs::DeliveryRecords(const wxString& id, const wxString& name, const wxString& jobName) const
 {
-    const wxString path =
-        wxFileName(m_places.failedFolder, JobRunner::kFailureLogName).GetFullPath();
-    // Append mode: whole lines, whoever else writes the log.
-    FILE* log = std::fopen(Native(path).c_str(), "a");
-    if (!log)
+    std::vector<FolderJournal::Record> records{FolderJournal::Deliver(id, name)};
+    if (!m_places.cupsQueue.empty())
     {
-        ServiceLog(Severity::Error, "cannot write the failure log " + path);
-        return;
+        PrintRecord print;
+        print.id = id;
+        print.queue = m_places.cupsQueue;
+        print.output = wxFileName(m_places.outputFolder, name).GetFullPath();
+        print.jobName = jobName;
+        records.push_back(FolderJournal::Print(print));
     }
-    const wxString line =
-        wxDateTime::Now().FormatISOCombined(' ') + "\t" + name + "\t" + reason + "\n";
-    std::fputs(ToUtf8(line).c_str(), log);
-    std::fclose(log);
+    return records;
 }
 
 void ServiceJobs::Recover()
@@ -487,6 +485,7 @@ void ServiceJobs::Recover()
             // Never claimed anything, or finished but for the clean-up.
             RemoveStaged(entry);
             RemoveTree(work);
+            m_journal.ForgetDelivery(entry);
             continue;
         }
         const wxString jobName = wxFileName(originals[0]).GetFullName();
@@ -512,9 +511,5 @@ void ServiceJobs::Recover()
         }
     }
     Commit();
-    bool inHand = false;
-    for (const wxString& entry : EntryNames(m_places.workFolder))
-        inHand = inHand || entry.StartsWith(kJobPrefix);
-    if (!inHand)
-        m_journal.Clear();
+    m_journal.CompactIfLarge();
 }

@@ -3,10 +3,11 @@
 
 #include <hotfolder/HFPlugin.h>
 
-#include "jobs/JobRunner.h"
+#include "jobs/JobPlaces.h"
 
 class FilterSession;
 class FolderJournal;
+class JobReport;
 class RunStatistics;
 
 // The service's road of one job, made so that a kill at any instant leaves,
@@ -24,7 +25,10 @@ class RunStatistics;
 // 4. For the whole batch at once: the staged files are synced to disk, then
 //    the chosen names are recorded in the folder's journal (synced), then
 //    output and ticket are renamed to their final names without replacing
-//    anything, and the output folder is synced.
+//    anything, and the output folder is synced. For a folder that prints,
+//    each delivery's record goes with the record that its output is to be
+//    printed, so no output can be delivered and then forgotten by the
+//    printing (FolderPrinting takes it from there).
 // 5. The originals move to the kept-originals folder; the work directory is
 //    emptied and kept as a spare "spare-<n>" for the next job of a burst;
 //    spares go when the folder has nothing more to do.
@@ -40,9 +44,9 @@ class ServiceJobs
 {
 public:
     ServiceJobs(FilterSession& session, const JobPlaces& places, const wxString& hotFolder,
-                FolderJournal& journal, RunStatistics& statistics)
+                FolderJournal& journal, RunStatistics& statistics, JobReport& report)
         : m_session(session), m_places(places), m_hotFolder(hotFolder), m_journal(journal),
-          m_statistics(statistics)
+          m_statistics(statistics), m_report(report)
     {
     }
 
@@ -80,7 +84,9 @@ private:
     // The work directory of a finished job, its originals gone: emptied and
     // kept as a spare, or removed when there are enough.
     void Retire(const wxString& id);
-    void LogFailure(const wxString& name, const wxString& reason);
+    // The records that announce a delivery (and its printing) under name.
+    std::vector<std::vector<std::string>> DeliveryRecords(const wxString& id, const wxString& name,
+                                                          const wxString& jobName) const;
     wxString WorkDirectory(const wxString& id) const;
     wxString OriginalsDirectory(const wxString& id) const;
     wxString StagedPath(const wxString& id, const char* what) const;
@@ -91,6 +97,7 @@ private:
     wxString m_hotFolder;
     FolderJournal& m_journal;
     RunStatistics& m_statistics;
+    JobReport& m_report;
     std::vector<Staged> m_staged;
     std::vector<wxString> m_spares;
     unsigned m_spareCounter = 0;

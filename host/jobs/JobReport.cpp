@@ -1,0 +1,82 @@
+#include "jobs/JobReport.h"
+
+#include "cli/ConsoleText.h"
+#include "cli/ProgressDisplay.h"
+#include "jobs/JobPlaces.h"
+#include "service/ServiceLog.h"
+
+const char kFailureLogName[] = "failed-jobs.log";
+const char kTicketSuffix[] = ".Folder.cfg";
+
+void ServiceReport::Done(const wxString& line)
+{
+    ServiceLog(Severity::Info, line);
+}
+
+void ServiceReport::Failed(const wxString& jobName, const wxString& reason,
+                           const wxString& original)
+{
+    ServiceLog(Severity::Error, jobName + ": failed: " + reason + "; " + original);
+}
+
+void ServiceReport::Refused(const wxString& path)
+{
+    ServiceLog(Severity::Warning, "refused (left in place): " + path);
+}
+
+void ServiceReport::Info(const wxString& line)
+{
+    ServiceLog(Severity::Info, line);
+}
+
+void ServiceReport::Warning(const wxString& line)
+{
+    ServiceLog(Severity::Warning, line);
+}
+
+void ServiceReport::Error(const wxString& line)
+{
+    ServiceLog(Severity::Error, line);
+}
+
+void ConsoleReport::Begin(size_t index, size_t total, const wxString& name)
+{
+    m_progress.BeginJob(index, total, name);
+}
+
+void ConsoleReport::Done(const wxString& line)
+{
+    m_progress.EndJob(line);
+}
+
+void ConsoleReport::Failed(const wxString& jobName, const wxString& reason,
+                           const wxString& original)
+{
+    m_progress.EndJob(jobName + ": failed: " + reason);
+    PrintError(jobName + ": " + reason + "; " + original);
+}
+
+void ConsoleReport::Refused(const wxString& path)
+{
+    m_progress.Note("refused (left in place): " + path);
+}
+
+void ConsoleReport::Info(const wxString& line)
+{
+    m_progress.Note(line);
+}
+
+void ConsoleReport::Warning(const wxString& line)
+{
+    PrintError(line);
+}
+
+void ConsoleReport::Error(const wxString& line)
+{
+    PrintError(line);
+}
+
+IProgressTracker* ConsoleReport::Progress()
+{
+    return &m_progress;
+}

@@ -1,0 +1,41 @@
+#include "service/FailureLog.h"
+
+#include <fcntl.h>
+#include <string>
+#include <unistd.h>
+
+#include <wx/datetime.h>
+#include <wx/filename.h>
+
+#include "cli/ConsoleText.h"
+#include "jobs/JobPlaces.h"
+#include "jobs/JobReport.h"
+
+bool AppendLogLine(const wxString& path, const std::vector<wxString>& fields)
+{
+    std::string line;
+    for (size_t i = 0; i < fields.size(); ++i)
+    {
+        std::string field = ToUtf8(fields[i]);
+        for (char& c : field)
+            if (c == '\t' || c == '\n' || c == '\r')
+                c = ' ';
+        line += (i ? "\t" : "") + field;
+    }
+    line += "\n";
+    // Append mode and one write: whole lines, whoever else writes the log.
+    const int fd = open(path.fn_str(), O_WRONLY | O_CREAT | O_APPEND | O_CLOEXEC, 0644);
+    if (fd < 0)
+        return false;
+    const bool written = write(fd, line.data(), line.size()) == static_cast<ssize_t>(line.size());
+    close(fd);
+    return written;
+}
+
+void AppendFailureLine(const wxString& failedFolder, const wxString& name, const wxString& reason,
+                       JobReport& report)
+{
+    const wxString path = wxFileName(failedFolder, kFailureLogName).GetFullPath();
+    if (!AppendLogLine(path, {wxDateTime::Now().FormatISOCombined(' '), name, reason}))
+        report.Error("cannot write the failure log " + path);
+}
