@@ -58,6 +58,12 @@ FolderPrinting::FolderPrinting(FolderJournal& journal, const wxString& container
     std::string reason;
     if (std::getline(held, reason) && !reason.empty())
         m_held = FromUtf8(reason);
+    for (const PrintRecord& print : m_journal.Prints())
+    {
+        m_replayed.insert(print.id);
+        if (!print.sent)
+            m_unchecked.insert(print.id);
+    }
 }
 
 bool FolderPrinting::Waiting() const
@@ -78,7 +84,7 @@ bool FolderPrinting::Following() const
 
 bool FolderPrinting::SubmitOne(const PrintRecord& print)
 {
-    if (!m_checked.count(print.id))
+    if (m_unchecked.count(print.id))
     {
         if (!Check(print))
             return false;
@@ -96,7 +102,11 @@ bool FolderPrinting::SubmitOne(const PrintRecord& print)
     const int job = printing::CreateMarkedJob(
         print.queue, title, TicketOptions(print.output + kTicketSuffix), ToUtf8(print.id), error);
     if (job == 0)
+    {
+        // The scheduler may have made the job and lost the answer.
+        m_unchecked.insert(print.id);
         return Trouble(print, error);
+    }
     // Not synced: lost only with a power cut, and then the marker finds the job.
     m_journal.Append({FolderJournal::Job(print.id, job)}, false);
     if (!printing::SendJobDocument(print.queue, job, title, ToUtf8(print.output), error))
@@ -104,7 +114,7 @@ bool FolderPrinting::SubmitOne(const PrintRecord& print)
         printing::CupsError ignored;
         printing::CancelJob(print.queue, job, ignored);
         // If that cancel did not reach the scheduler, the next try looks first.
-        m_checked.erase(print.id);
+        m_unchecked.insert(print.id);
         return Trouble(print, error);
     }
     if (!m_journal.Append({FolderJournal::Sent(print.id)}))
@@ -116,11 +126,6 @@ bool FolderPrinting::SubmitOne(const PrintRecord& print)
 
 bool FolderPrinting::Check(const PrintRecord& print)
 {
-    if (print.sent)
-    {
-        m_checked.insert(print.id);
-        return true;
-    }
     // One listing of the queue's marked jobs serves every replayed record.
     printing::CupsError error;
     if (!m_listed.count(print.queue))
@@ -128,8 +133,7 @@ bool FolderPrinting::Check(const PrintRecord& print)
         if (!printing::ListMarkedJobs(print.queue, m_marked[print.queue], error))
         {
             m_marked.erase(print.queue);
-            Hold(print.queue, error.reason);
-            return false;
+            return Trouble(print, error);
         }
         m_listed.insert(print.queue);
     }
@@ -149,7 +153,7 @@ bool FolderPrinting::Check(const PrintRecord& print)
             return false;
         }
     }
-    m_checked.insert(print.id);
+    m_unchecked.erase(print.id);
     return true;
 }
 
@@ -171,6 +175,7 @@ void FolderPrinting::Hold(const std::string& queue, const std::string& reason)
     m_retryAt = Clock::now() + m_pause;
     // The listing may be stale by the next try.
     m_listed.clear();
+    m_marked.clear();
     const wxString why = "printing on " + FromUtf8(queue) + " held: " + FromUtf8(reason);
     if (why == m_held)
         return;
@@ -233,8 +238,7 @@ void FolderPrinting::End(const PrintRecord& print, printing::JobEnd end,
                          const std::string& reasons)
 {
     // Only a verdict an earlier process may have logged is looked for.
-    const bool replayed = !m_checked.count(print.id);
-    if (!replayed || !AlreadyLogged(print.id))
+    if (!m_replayed.count(print.id) || !AlreadyLogged(print.id))
     {
         AppendLogLine(wxFileName(m_container, kPrintedLogName).GetFullPath(),
                       {wxDateTime::Now().FormatISOCombined(' '), EndName(end),

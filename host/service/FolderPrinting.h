@@ -85,8 +85,10 @@ private:
     wxString m_failedFolder;
     JobReport& m_report;
     RunStatistics& m_statistics;
-    // Records this process made or checked; the others come from a replay.
-    std::set<wxString> m_checked;
+    // Records found in the journal at the start (a replay), and those of
+    // them (or of this process's tries) whose job must be looked for first.
+    std::set<wxString> m_replayed;
+    std::set<wxString> m_unchecked;
     // Marked jobs of a queue as last listed, for checking replayed records.
     std::map<std::string, std::map<std::string, std::vector<printing::JobState>>> m_marked;
     std::set<std::string> m_listed; // queues whose marked jobs m_marked holds

@@ -157,17 +157,33 @@ const char* const kJobAttributes[] = {"job-id",
 int CreateMarkedJob(const std::string& queue, const std::string& title, const OptionList& options,
                     const std::string& marker, CupsError& error)
 {
+    // The request by hand: the library's own call answers an unknown queue
+    // and an unreachable scheduler alike, and the two must be told apart.
     int count = 0;
     cups_option_t* list = nullptr;
     for (const auto& [name, value] : options)
         count = cupsAddOption(name.c_str(), value.c_str(), count, &list);
     if (!marker.empty())
         count = cupsAddOption(kJobMarkerOption, marker.c_str(), count, &list);
-    const int job = cupsCreateJob(CUPS_HTTP_DEFAULT, queue.c_str(), title.c_str(), count, list);
+    ipp_t* request = ippNewRequest(IPP_OP_CREATE_JOB);
+    ippAddString(request, IPP_TAG_OPERATION, IPP_TAG_URI, "printer-uri", nullptr,
+                 PrinterUri(queue).c_str());
+    ippAddString(request, IPP_TAG_OPERATION, IPP_TAG_NAME, "requesting-user-name", nullptr,
+                 cupsUser());
+    ippAddString(request, IPP_TAG_OPERATION, IPP_TAG_NAME, "job-name", nullptr, title.c_str());
+    cupsEncodeOptions2(request, count, list, IPP_TAG_OPERATION);
+    cupsEncodeOptions2(request, count, list, IPP_TAG_JOB);
+    cupsEncodeOptions2(request, count, list, IPP_TAG_SUBSCRIPTION);
     cupsFreeOptions(count, list);
-    if (job <= 0)
+    Response response = Request(request);
+    ipp_attribute_t* id =
+        Succeeded(response) ? ippFindAttribute(response.get(), "job-id", IPP_TAG_INTEGER) : nullptr;
+    if (!id)
+    {
         Failed(("cannot create a job on " + queue).c_str(), error);
-    return job > 0 ? job : 0;
+        return 0;
+    }
+    return ippGetInteger(id, 0);
 }
 
 bool SendJobDocument(const std::string& queue, int job, const std::string& title,
