@@ -236,8 +236,7 @@ int ExecuteRun(const RunRequest& request, RunSetup& setup)
         progress.Note("the StopHF marker is present; nothing is processed");
     else
     {
-        const int status =
-            RunOnce(options, setup.folder.GetFolder(), report, statistics, printed);
+        const int status = RunOnce(options, setup.folder.GetFolder(), report, statistics, printed);
         if (status != kExitSuccess)
             return status;
     }
@@ -246,7 +245,7 @@ int ExecuteRun(const RunRequest& request, RunSetup& setup)
     if (request.stats)
         statistics.PrintTiming();
     return statistics.failed == 0 && statistics.notPrinted == 0 && printed ? kExitSuccess
-                                                                          : kExitJobsFailed;
+                                                                           : kExitJobsFailed;
 }
 } // namespace
 

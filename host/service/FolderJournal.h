@@ -8,10 +8,10 @@
 // A delivered output's way to the printer, as far as the journal knows.
 struct PrintRecord
 {
-    wxString id;         // the job's work directory name, also its marker at the scheduler
-    std::string queue;   // where it prints
-    wxString output;     // the delivered output
-    wxString jobName;    // the original's file name, the job's name at the scheduler
+    wxString id;          // the job's work directory name, also its marker at the scheduler
+    std::string queue;    // where it prints
+    wxString output;      // the delivered output
+    wxString jobName;     // the original's file name, the job's name at the scheduler
     int schedulerJob = 0; // the scheduler's job id once created
     bool sent = false;    // the whole document is at the scheduler
 };

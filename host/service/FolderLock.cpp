@@ -74,11 +74,10 @@ bool FolderLock::Acquire(const wxString& container, Holder holder, wxString& err
         m_fd = -1;
         return false;
     }
-    const std::string text =
-        std::string(holder == Holder::Service ? "service " : "run ") + std::to_string(getpid()) +
-        "\n";
+    const std::string text = std::string(holder == Holder::Service ? "service " : "run ") +
+                             std::to_string(getpid()) + "\n";
     if (writable && (ftruncate(m_fd, 0) != 0 || pwrite(m_fd, text.data(), text.size(), 0) !=
-                                                     static_cast<ssize_t>(text.size())))
+                                                    static_cast<ssize_t>(text.size())))
     {
         error = "cannot write the folder lock " + path;
         close(m_fd);

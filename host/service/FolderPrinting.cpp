@@ -161,8 +161,8 @@ bool FolderPrinting::Trouble(const PrintRecord& print, const printing::CupsError
 {
     if (error.trouble == printing::CupsTrouble::Refused)
     {
-        Refuse(print, "submission to " + FromUtf8(print.queue) + " failed: " +
-                          FromUtf8(error.reason));
+        Refuse(print,
+               "submission to " + FromUtf8(print.queue) + " failed: " + FromUtf8(error.reason));
         return true;
     }
     Hold(print.queue, error.reason);
@@ -234,8 +234,7 @@ bool FolderPrinting::AlreadyLogged(const wxString& id)
     return m_loggedIds.count(id) != 0;
 }
 
-void FolderPrinting::End(const PrintRecord& print, printing::JobEnd end,
-                         const std::string& reasons)
+void FolderPrinting::End(const PrintRecord& print, printing::JobEnd end, const std::string& reasons)
 {
     // Only a verdict an earlier process may have logged is looked for.
     if (!m_replayed.count(print.id) || !AlreadyLogged(print.id))
@@ -253,10 +252,9 @@ void FolderPrinting::End(const PrintRecord& print, printing::JobEnd end,
         else
         {
             ++m_statistics.notPrinted;
-            const wxString reason =
-                wxString::Format("printer: CUPS job %d on %s %s: %s", print.schedulerJob,
-                                 FromUtf8(print.queue), EndName(end),
-                                 reasons.empty() ? wxString("no reason given") : FromUtf8(reasons));
+            const wxString reason = wxString::Format(
+                "printer: CUPS job %d on %s %s: %s", print.schedulerJob, FromUtf8(print.queue),
+                EndName(end), reasons.empty() ? wxString("no reason given") : FromUtf8(reasons));
             AppendFailureLine(m_failedFolder, print.jobName, reason, m_report);
             m_report.Error(print.jobName + ": " + reason);
         }
@@ -276,7 +274,8 @@ void FolderPrinting::Follow(bool now)
         if (!print.sent)
             continue;
         printing::CupsError error;
-        if (!open.count(print.queue) && !printing::OpenJobIds(print.queue, open[print.queue], error))
+        if (!open.count(print.queue) &&
+            !printing::OpenJobIds(print.queue, open[print.queue], error))
             return; // the scheduler is away: asked again next time
         if (open[print.queue].count(print.schedulerJob))
             continue;

@@ -12,11 +12,15 @@
 #include <wx/sstream.h>
 #include <wx/xml/xml.h>
 
+#include "CupsJobs.h"
 #include "cli/ConsoleText.h"
+#include "db/PathResolver.h"
 #include "folder/FolderWatcher.h"
 #include "folder/HotFolder.h"
 #include "jobs/JobPlaces.h"
 #include "module/FilterSettings.h"
+#include "service/FolderJournal.h"
+#include "service/FolderPrinting.h"
 
 namespace
 {
@@ -78,13 +82,14 @@ void CountKept(const wxString& directory, FolderStatus& status)
 
 void CountFailed(const wxString& directory, FolderStatus& status)
 {
-    std::ifstream log(
-        std::string(wxFileName(directory, kFailureLogName).GetFullPath().fn_str()));
+    std::ifstream log(std::string(wxFileName(directory, kFailureLogName).GetFullPath().fn_str()));
     const std::string today = ToUtf8(wxDateTime::Now().FormatISODate());
     std::string line, last;
     while (std::getline(log, line))
     {
-        if (line.empty())
+        const size_t reason = line.find('\t', line.find('\t') + 1);
+        if (line.empty() ||
+            (reason != std::string::npos && line.compare(reason + 1, 8, "retried:") == 0))
             continue;
         ++status.failedTotal;
         status.failedToday += line.compare(0, today.size(), today) == 0;
@@ -100,6 +105,63 @@ void CountFailed(const wxString& directory, FolderStatus& status)
             rest.replace(second, 1, ": ");
         status.lastFailure = FromUtf8(rest);
     }
+}
+// printed-jobs.log: time, verdict, queue, job id, name, work id, reason.
+void CountPrinted(const wxString& container, FolderStatus& status)
+{
+    std::ifstream log(
+        std::string(wxFileName(container, FolderPrinting::kPrintedLogName).GetFullPath().fn_str()));
+    const std::string today = ToUtf8(wxDateTime::Now().FormatISODate());
+    std::string line;
+    while (std::getline(log, line))
+    {
+        std::vector<std::string> fields;
+        for (size_t start = 0, tab = 0; tab != std::string::npos; start = tab + 1)
+        {
+            tab = line.find('\t', start);
+            fields.push_back(line.substr(start, tab == std::string::npos ? tab : tab - start));
+        }
+        if (fields.size() < 7)
+            continue;
+        const bool isToday = fields[0].compare(0, today.size(), today) == 0;
+        if (fields[1] == "completed")
+        {
+            ++status.printedTotal;
+            status.printedToday += isToday;
+            continue;
+        }
+        status.printFailedToday += isToday;
+        status.lastPrintFailure =
+            FromUtf8(fields[4] + ": " + fields[1] + " on " + fields[2] +
+                     (fields[3] != "0" ? " (CUPS job " + fields[3] + ")" : "") +
+                     (fields[6].empty() ? "" : ": " + fields[6]));
+    }
+}
+
+void ReadPrinting(const HotFolder& folder, FolderStatus& status)
+{
+    const wxString container = db::PathResolver::GetContainerFolderPath(folder.GetFolder());
+    status.queue = folder.GetBoundQueue();
+    status.printing = FolderJournal::ReadOnly(container).Prints().size();
+    CountPrinted(container, status);
+    std::ifstream held(
+        std::string(wxFileName(container, FolderPrinting::kHeldName).GetFullPath().fn_str()));
+    std::string reason;
+    if (std::getline(held, reason))
+        status.printingHeld = FromUtf8(reason);
+    if (status.queue.empty())
+        return;
+    printing::QueueState state;
+    printing::CupsError error;
+    if (printing::GetQueueState(status.queue, state, error))
+    {
+        status.queueState = state.state;
+        status.queueReasons = state.reasons;
+        if (!state.accepting)
+            status.queueReasons.push_back("not-accepting-jobs");
+    }
+    else
+        status.queueState = "unknown (" + error.reason + ")";
 }
 } // namespace
 
@@ -131,5 +193,6 @@ FolderStatus ReadFolderStatus(const wxString& path)
     status.waiting = ListFolderFiles(folder.GetFolder()).size();
     CountKept(folder.GetKeptOriginalsFolder(), status);
     CountFailed(folder.GetFailedFolder(), status);
+    ReadPrinting(folder, status);
     return status;
 }

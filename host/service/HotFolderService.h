@@ -10,13 +10,13 @@ class RunStatistics;
 
 struct ServiceOptions
 {
-    FolderOptions folder;  // how each folder is worked
-    bool stats = false;    // print where the time went when it ends
+    FolderOptions folder; // how each folder is worked
+    bool stats = false;   // print where the time went when it ends
     // One folder instead of the machine-wide list ("hotfolder run --watch"):
     // no service lock or RunService marker, and the StopHF marker ends the
     // loop instead of pausing it.
     wxString onlyFolder;
-    JobReport* report = nullptr;  // where messages go; the service log when null
+    JobReport* report = nullptr;     // where messages go; the service log when null
     RunStatistics* totals = nullptr; // receives the counts of every folder at the end
 };
 

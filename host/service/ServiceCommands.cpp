@@ -43,7 +43,10 @@ static const char kStatusUsage[] =
     "\n"
     "Tells whether the hot-folder service runs and, for every listed folder, its\n"
     "server, output type and page, the files waiting, the jobs done and failed\n"
-    "(today and in total) and the last failure. --json prints one JSON object.\n";
+    "(today and in total) and the last failure; for a folder that prints, its\n"
+    "queue with the state and reasons the scheduler reports, the jobs printing\n"
+    "now, printed (today and in total), the printer failures today and the last\n"
+    "one. --json prints one JSON object.\n";
 
 static const char kRemoveUsage[] =
     "usage: hotfolder remove FOLDER\n"
@@ -150,8 +153,8 @@ int RunStatusCommand(const Arguments& args)
         for (size_t i = 0; i < folders.size(); ++i)
         {
             const FolderStatus& folder = folders[i];
-            json << (i ? ", " : "") << "{\"path\": " << JsonText(folder.path)
-                 << ", \"problem\": " << JsonTextOrNull(folder.problem)
+            json << (i ? ", " : "") << "{\"path\": " << JsonText(folder.path) << ", \"problem\": "
+                 << JsonTextOrNull(folder.problem.empty() ? folder.printingHeld : folder.problem)
                  << ", \"server\": " << JsonTextOrNull(folder.server)
                  << ", \"output_type\": " << JsonTextOrNull(folder.outputType)
                  << ", \"page\": " << JsonTextOrNull(folder.page)
@@ -159,7 +162,18 @@ int RunStatusCommand(const Arguments& args)
                                      "%zu, \"failed_today\": %zu, \"failed_total\": %zu",
                                      folder.waiting, folder.doneToday, folder.doneTotal,
                                      folder.failedToday, folder.failedTotal)
-                 << ", \"last_failure\": " << JsonTextOrNull(folder.lastFailure) << "}";
+                 << ", \"last_failure\": " << JsonTextOrNull(folder.lastFailure)
+                 << ", \"queue\": " << JsonTextOrNull(FromUtf8(folder.queue))
+                 << ", \"queue_state\": " << JsonTextOrNull(FromUtf8(folder.queueState))
+                 << ", \"queue_reasons\": [";
+            for (size_t r = 0; r < folder.queueReasons.size(); ++r)
+                json << (r ? ", " : "") << JsonText(FromUtf8(folder.queueReasons[r]));
+            json << "], \"printing_held\": " << JsonTextOrNull(folder.printingHeld)
+                 << wxString::Format(", \"printing\": %zu, \"printed_today\": %zu, "
+                                     "\"printed_total\": %zu, \"print_failed_today\": %zu",
+                                     folder.printing, folder.printedToday, folder.printedTotal,
+                                     folder.printFailedToday)
+                 << ", \"last_print_failure\": " << JsonTextOrNull(folder.lastPrintFailure) << "}";
         }
         PrintLine(json + "]}");
         return kExitSuccess;
@@ -187,6 +201,22 @@ int RunStatusCommand(const Arguments& args)
                                    folder.failedTotal));
         PrintLine("  Last failure: " +
                   (folder.lastFailure.empty() ? wxString("(none)") : folder.lastFailure));
+        if (folder.queue.empty() && !folder.printing)
+            continue;
+        wxString queue = FromUtf8(folder.queue.empty() ? "(none)" : folder.queue);
+        if (!folder.queueState.empty())
+            queue += ", " + FromUtf8(folder.queueState);
+        for (const std::string& reason : folder.queueReasons)
+            queue += ", " + FromUtf8(reason);
+        PrintLine("  Printer:     " + queue);
+        if (!folder.printingHeld.empty())
+            PrintLine("  Problem:     " + folder.printingHeld);
+        PrintLine(wxString::Format("  Printing:    %zu now, %zu printed today, %zu in total, %zu "
+                                   "printer failure(s) today",
+                                   folder.printing, folder.printedToday, folder.printedTotal,
+                                   folder.printFailedToday));
+        if (!folder.lastPrintFailure.empty())
+            PrintLine("  Last printer failure: " + folder.lastPrintFailure);
     }
     return kExitSuccess;
 }

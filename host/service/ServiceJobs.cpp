@@ -162,8 +162,8 @@ JobOutcome ServiceJobs::Run(const ReadyToProcessJobInfo& job)
     const wxString work = WorkDirectory(id);
     if (!MakeWorkDirectory(id))
     {
-        m_report.Error(wxString::Format("%s: cannot make a work directory in %s: %s",
-                                        job.jobName, m_places.workFolder, Reason(errno)));
+        m_report.Error(wxString::Format("%s: cannot make a work directory in %s: %s", job.jobName,
+                                        m_places.workFolder, Reason(errno)));
         RemoveTree(work);
         return JobOutcome::OriginalStuck;
     }
@@ -373,8 +373,8 @@ bool ServiceJobs::Place(const wxString& id, wxString& name, const wxString& jobN
     }
     const wxString ticket = StagedPath(id, "ticket");
     wxString placedTicket, error;
-    if (Exists(ticket) && !MoveIntoDirectory(ticket, m_places.outputFolder,
-                                             name + kTicketSuffix, placedTicket, error))
+    if (Exists(ticket) && !MoveIntoDirectory(ticket, m_places.outputFolder, name + kTicketSuffix,
+                                             placedTicket, error))
         m_report.Warning(jobName + ": the job ticket stays at " + ticket);
     return true;
 }
@@ -440,8 +440,9 @@ JobOutcome ServiceJobs::Fail(const wxString& id, const wxString& jobName, const 
     return outcome;
 }
 
-std::vector<FolderJournal::Record>
-ServiceJobs::DeliveryRecords(const wxString& id, const wxString& name, const wxString& jobName) const
+std::vector<FolderJournal::Record> ServiceJobs::DeliveryRecords(const wxString& id,
+                                                                const wxString& name,
+                                                                const wxString& jobName) const
 {
     std::vector<FolderJournal::Record> records{FolderJournal::Deliver(id, name)};
     if (!m_places.cupsQueue.empty())

@@ -17,7 +17,7 @@ namespace printing
 enum class CupsTrouble
 {
     None,
-    Wait, // the scheduler is down, busy or the queue takes no jobs now: try later
+    Wait,   // the scheduler is down, busy or the queue takes no jobs now: try later
     Refused // the scheduler will never take this job (no such queue, bad request)
 };
 
@@ -58,14 +58,15 @@ struct JobState
     bool complete = false; // the scheduler has the whole document
     std::string reasons;   // job-state-reasons, or the printer's message
     std::string marker;    // given at creation; empty when none
+    std::string name;      // job-name
 };
 
 // The state of one job; found false when the scheduler no longer knows it.
 bool GetJobState(int job, JobState& state, bool& found, CupsError& error);
 
 // Every job of the queue that carries a marker, ended ones too, by marker.
-bool ListMarkedJobs(const std::string& queue,
-                    std::map<std::string, std::vector<JobState>>& jobs, CupsError& error);
+bool ListMarkedJobs(const std::string& queue, std::map<std::string, std::vector<JobState>>& jobs,
+                    CupsError& error);
 
 // The ids of the queue's jobs that have not ended.
 bool OpenJobIds(const std::string& queue, std::set<int>& ids, CupsError& error);

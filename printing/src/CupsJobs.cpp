@@ -43,6 +43,10 @@ bool Failed(const char* what, CupsError& error)
         break;
     default:
         error.trouble = CupsTrouble::Wait;
+        // The library keeps one connection and does not make it anew once
+        // the scheduler has gone (a restart): the next request opens a new one.
+        const std::string server = cupsServer();
+        cupsSetServer(server.c_str());
     }
     return false;
 }
@@ -57,6 +61,10 @@ std::string PrinterUri(const std::string& queue)
 
 Response Request(ipp_t* request)
 {
+    // As the jobs' owner: the scheduler shows others no job names.
+    if (!ippFindAttribute(request, "requesting-user-name", IPP_TAG_NAME))
+        ippAddString(request, IPP_TAG_OPERATION, IPP_TAG_NAME, "requesting-user-name", nullptr,
+                     cupsUser());
     return Response(cupsDoRequest(CUPS_HTTP_DEFAULT, request, "/"));
 }
 
@@ -120,6 +128,8 @@ std::vector<JobState> JobsOf(ipp_t* response)
         }
         if (!std::strcmp(name, "job-id"))
             job.id = ippGetInteger(a, 0);
+        else if (!std::strcmp(name, "job-name"))
+            job.name = ippGetString(a, 0, nullptr) ? ippGetString(a, 0, nullptr) : "";
         else if (!std::strcmp(name, "job-state"))
             job.end = EndOf(ippGetInteger(a, 0));
         else if (!std::strcmp(name, "job-state-reasons"))
@@ -147,6 +157,7 @@ std::vector<JobState> JobsOf(ipp_t* response)
 }
 
 const char* const kJobAttributes[] = {"job-id",
+                                      "job-name",
                                       "job-state",
                                       "job-state-reasons",
                                       "job-printer-state-message",
@@ -252,8 +263,8 @@ bool GetJobState(int job, JobState& state, bool& found, CupsError& error)
     return true;
 }
 
-bool ListMarkedJobs(const std::string& queue,
-                    std::map<std::string, std::vector<JobState>>& jobs, CupsError& error)
+bool ListMarkedJobs(const std::string& queue, std::map<std::string, std::vector<JobState>>& jobs,
+                    CupsError& error)
 {
     ipp_t* request = ippNewRequest(IPP_OP_GET_JOBS);
     ippAddString(request, IPP_TAG_OPERATION, IPP_TAG_URI, "printer-uri", nullptr,
@@ -306,16 +317,16 @@ bool GetQueueState(const std::string& queue, QueueState& state, CupsError& error
     state = QueueState();
     if (ipp_attribute_t* a = ippFindAttribute(response.get(), "printer-state", IPP_TAG_ENUM))
         state.state = ippEnumString("printer-state", ippGetInteger(a, 0));
-    if (ipp_attribute_t* a = ippFindAttribute(response.get(), "printer-state-reasons",
-                                              IPP_TAG_KEYWORD))
+    if (ipp_attribute_t* a =
+            ippFindAttribute(response.get(), "printer-state-reasons", IPP_TAG_KEYWORD))
         for (int i = 0; i < ippGetCount(a); ++i)
             if (std::strcmp(ippGetString(a, i, nullptr), "none") != 0)
                 state.reasons.push_back(ippGetString(a, i, nullptr));
-    if (ipp_attribute_t* a = ippFindAttribute(response.get(), "printer-state-message",
-                                              IPP_TAG_TEXT))
+    if (ipp_attribute_t* a =
+            ippFindAttribute(response.get(), "printer-state-message", IPP_TAG_TEXT))
         state.message = ippGetString(a, 0, nullptr) ? ippGetString(a, 0, nullptr) : "";
-    if (ipp_attribute_t* a = ippFindAttribute(response.get(), "printer-is-accepting-jobs",
-                                              IPP_TAG_BOOLEAN))
+    if (ipp_attribute_t* a =
+            ippFindAttribute(response.get(), "printer-is-accepting-jobs", IPP_TAG_BOOLEAN))
         state.accepting = ippGetBoolean(a, 0) != 0;
     return true;
 }

@@ -46,22 +46,26 @@ public:
         address.sin_family = AF_INET;
         address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
         socklen_t size = sizeof address;
-        const int probe = socket(AF_INET, SOCK_STREAM, 0);
-        if (bind(probe, reinterpret_cast<sockaddr*>(&address), size) == 0 &&
+        // Started again after a stop, it listens where its clients look.
+        address.sin_port = htons(static_cast<uint16_t>(m_port));
+        const int probe = m_port ? -1 : socket(AF_INET, SOCK_STREAM, 0);
+        if (probe >= 0 && bind(probe, reinterpret_cast<sockaddr*>(&address), size) == 0 &&
             getsockname(probe, reinterpret_cast<sockaddr*>(&address), &size) == 0)
             m_port = ntohs(address.sin_port);
-        close(probe);
+        if (probe >= 0)
+            close(probe);
         // Filters run as the unprivileged print user and must reach the spool.
         chmod(m_root.c_str(), 0755);
         for (const char* dir : {"/spool", "/spool/tmp", "/cache", "/state", "/log", "/conf"})
             mkdir((m_root + dir).c_str(), 0755);
-        testkit::WriteFile(m_root + "/cupsd.conf",
-                           "Listen 127.0.0.1:" + std::to_string(m_port) +
-                               "\nLogLevel debug\nDefaultAuthType None\nWebInterface No\n"
-                               "Browsing Off\n<Location />\n  Order allow,deny\n  Allow all\n"
-                               "</Location>\n<Location /admin>\n  Order allow,deny\n  Allow all\n"
-                               "</Location>\n<Policy default>\n  <Limit All>\n    Order deny,allow"
-                               "\n  </Limit>\n</Policy>\n");
+        testkit::WriteFile(
+            m_root + "/cupsd.conf",
+            "Listen 127.0.0.1:" + std::to_string(m_port) +
+                "\nLogLevel debug\nDefaultAuthType None\nWebInterface No\nMaxJobs 0\n"
+                "Browsing Off\n<Location />\n  Order allow,deny\n  Allow all\n"
+                "</Location>\n<Location /admin>\n  Order allow,deny\n  Allow all\n"
+                "</Location>\n<Policy default>\n  <Limit All>\n    Order deny,allow"
+                "\n  </Limit>\n</Policy>\n");
         std::string files = "FileDevice Yes\nPrintcap\n";
         for (const char* line : {"ServerRoot /conf", "RequestRoot /spool", "TempDir /spool/tmp",
                                  "CacheDir /cache", "StateDir /state", "ErrorLog /log/error_log",
@@ -104,12 +108,13 @@ public:
         m_pid = 0;
     }
 
-    // A queue printing to a file through the given PPD's filters.
+    // A queue printing to a file through the given PPD's filters (none: raw).
     bool AddFileQueue(const std::string& name, const std::string& ppd, const std::string& file,
                       std::string& problem)
     {
-        const auto run = testkit::RunProgram(
-            {Find("lpadmin"), "-h", Server(), "-p", name, "-v", "file://" + file, "-P", ppd, "-E"});
+        const auto run = testkit::RunProgram({Find("lpadmin"), "-h", Server(), "-p", name, "-v",
+                                              "file://" + file, ppd.empty() ? "-m" : "-P",
+                                              ppd.empty() ? "raw" : ppd, "-E"});
         problem = run.err;
         return run.exitCode == 0;
     }
