@@ -1,8 +1,12 @@
 // The service killed with SIGKILL at seeded random moments while files flow
-// through two folders, restarted each time: afterwards every original is
-// kept once and has exactly one whole output, and nothing is left behind.
+// through two folders, one of them printing, restarted each time: afterwards
+// every original is kept once and has exactly one whole output, the printing
+// folder's originals are each one completed job at the scheduler, and
+// nothing is left behind.
 #include <random>
 
+#include "CupsJobs.h"
+#include "PrivateCupsd.h"
 #include "ServiceTestSupport.h"
 
 using namespace service_test;
@@ -13,6 +17,19 @@ TEST_F(ServiceTest, KilledAtAnyMomentEveryFileIsDeliveredExactlyOnce)
 {
     const std::vector<std::string> folders = {MakePostScriptFolder("A4", "a"),
                                               MakePostScriptFolder("Letter", "b")};
+    // Folder a prints on a raw queue of a scheduler of the test's own.
+    std::unique_ptr<cups_test::PrivateCupsd> cups;
+    if (cups_test::PrivateCupsd::Installed())
+    {
+        chmod(scratch.c_str(), 0755);
+        mkdir((scratch + "/cups").c_str(), 0755);
+        cups = std::make_unique<cups_test::PrivateCupsd>(scratch + "/cups");
+        std::string problem;
+        ASSERT_TRUE(cups->Start(problem)) << problem;
+        setenv("CUPS_SERVER", cups->Server().c_str(), 1);
+        ASSERT_TRUE(cups->AddFileQueue("press", "", "/dev/null", problem)) << problem;
+        WriteFile(Container(folders[0]) + "/PrinterQueue.txt", "press\n");
+    }
     const int kKills = 100, kFilesPerFolderAndRound = 5;
     std::mt19937 random(20240515);
     std::uniform_int_distribution<int> delayMs(0, 25);
@@ -60,7 +77,8 @@ TEST_F(ServiceTest, KilledAtAnyMomentEveryFileIsDeliveredExactlyOnce)
                     if (!ListDirectory(Work(folder)).empty() ||
                         ListDirectory(folder).size() != 2) // the container and Output
                         return false;
-                return true;
+                // and every output of the printing folder is at the scheduler
+                return Count(Host({"status", "--json"}).out, "\"printing\": 0,") == 2;
             },
             60000))
             << host.Err();
@@ -96,4 +114,40 @@ TEST_F(ServiceTest, KilledAtAnyMomentEveryFileIsDeliveredExactlyOnce)
         EXPECT_EQ(AllEntries(Work(folder)), std::vector<std::string>()) << folder;
         EXPECT_EQ(ListDirectory(Failed(folder)), std::vector<std::string>()) << folder;
     }
+    if (!cups)
+        return;
+    // Each original of the printing folder is one completed job, by name;
+    // none is left waiting at the scheduler.
+    std::map<std::string, std::vector<printing::JobState>> jobs;
+    printing::CupsError error;
+    std::map<std::string, int> completed;
+    int open = 0;
+    ASSERT_TRUE(WaitFor(
+        [&]
+        {
+            std::this_thread::sleep_for(std::chrono::milliseconds(200));
+            completed.clear();
+            open = 0;
+            if (!printing::ListMarkedJobs("press", jobs, error))
+                return false;
+            for (const auto& marked : jobs)
+                for (const printing::JobState& job : marked.second)
+                {
+                    completed[job.name] += job.end == printing::JobEnd::Completed;
+                    open += job.end == printing::JobEnd::Open;
+                }
+            return open == 0;
+        },
+        60000))
+        << error.reason << open;
+    size_t printed = 0;
+    for (const std::string& path : dropped)
+        if (path.compare(0, folders[0].size() + 1, folders[0] + "/") == 0)
+        {
+            ++printed;
+            const std::string name = path.substr(folders[0].size() + 1) + ".eps";
+            EXPECT_EQ(completed[name], 1) << name;
+        }
+    EXPECT_EQ(completed.size(), printed);
+    unsetenv("CUPS_SERVER");
 }
