@@ -250,3 +250,41 @@ TEST_F(ServiceTest, TheInstalledUnitVerifies)
     EXPECT_EQ(verify.exitCode, 0) << verify.out << verify.err;
     EXPECT_EQ(verify.err, "");
 }
+
+TEST_F(ServiceTest, RunWalksTheServicesRoadOneProcessAFolder)
+{
+    const std::string folder = MakePostScriptFolder("A4", "hot");
+    for (int i = 0; i < 300; ++i)
+        WriteFile(folder + "/f" + std::to_string(i) + ".eps", label);
+    // Two runs at once: one works the folder, the other says who does.
+    {
+        BackgroundHost first({"run", folder}, scratch), second({"run", folder}, scratch);
+        const int a = first.Wait(120000), b = second.Wait(120000);
+        EXPECT_EQ(std::min(a, b), 0) << first.Err() << second.Err();
+        EXPECT_EQ(std::max(a, b), 3) << first.Err() << second.Err();
+        EXPECT_NE((a == 3 ? first : second).Err().find("the folder is worked by another run, pid "),
+                  std::string::npos)
+            << first.Err() << second.Err();
+        EXPECT_NE((a == 0 ? first : second).Out().find("300 done, 0 failed"), std::string::npos);
+    }
+    const std::vector<std::string> outputs = ListDirectory(folder + "/Output");
+    EXPECT_EQ(outputs.size(), 600u);
+    EXPECT_EQ(std::count_if(outputs.begin(), outputs.end(),
+                            [](const std::string& name) { return name.find("(2)") != name.npos; }),
+              0);
+    // A file its writer still holds open is left for later.
+    const int writer = open((folder + "/open.eps").c_str(), O_WRONLY | O_CREAT | O_EXCL, 0644);
+    WriteSome(writer, label);
+    EXPECT_EQ(Host({"run", folder}).exitCode, 0);
+    EXPECT_TRUE(Exists(folder + "/open.eps"));
+    close(writer);
+    EXPECT_EQ(Host({"run", folder}).exitCode, 0);
+    EXPECT_FALSE(Exists(folder + "/open.eps"));
+    // A folder the service serves is left to it.
+    auto host = Serve(1);
+    testkit::ProcessResult run = Host({"run", folder});
+    EXPECT_EQ(run.exitCode, 3);
+    EXPECT_NE(run.err.find("the folder is served by the hot-folder service, pid "),
+              std::string::npos)
+        << run.err;
+}
