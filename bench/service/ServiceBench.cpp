@@ -275,14 +275,13 @@ int BenchPrinting(const testkit::ScratchDir& scratch, const std::string& host,
     // A raw queue offers no papers to describe: the example server's, bound by hand.
     testkit::RunProgram({host, "init", folder, "--server", HF_EXAMPLE_SERVER});
     testkit::WriteFile(folder + "/[_Orv_HotFolder_]/PrinterQueue.txt", "press\n");
-    testkit::RunProgram({host, "settings", folder, "--set", "OUTPUTFILETYPEEPS=0",
-                         "OUTPUTFILETYPEPS=1"});
+    testkit::RunProgram(
+        {host, "settings", folder, "--set", "OUTPUTFILETYPEEPS=0", "OUTPUTFILETYPEPS=1"});
     const std::string log = scratch.File("print-err.txt");
     Service service;
     service.pid = testkit::StartProgram({host, "serve"}, "", log);
-    if (!testkit::WaitFor([&] { return testkit::ReadFile(log).find("<6>serving ") !=
-                                       std::string::npos; },
-                          10000))
+    if (!testkit::WaitFor(
+            [&] { return testkit::ReadFile(log).find("<6>serving ") != std::string::npos; }, 10000))
         return 1;
     std::vector<double> millis;
     for (int i = 0; i < latencyFiles; ++i)
@@ -293,9 +292,7 @@ int BenchPrinting(const testkit::ScratchDir& scratch, const std::string& host,
         const auto dropped = Clock::now();
         if (!testkit::WaitFor(
                 [&]
-                {
-                    return testkit::ReadFile(log).find(name + ": queued on") != std::string::npos;
-                },
+                { return testkit::ReadFile(log).find(name + ": queued on") != std::string::npos; },
                 10000))
         {
             std::fprintf(stderr, "bench_service: %s was not queued\n%s", name.c_str(),
