@@ -53,15 +53,25 @@ TEST_F(ServiceTest, KilledAtAnyMomentEveryFileIsDeliveredExactlyOnce)
             BackgroundHost host({"serve", "--settle", "100"}, scratch);
             ASSERT_TRUE(host.Started());
             // Mostly timed from the start of serving, so a slow start
-            // (sanitizers) does not swallow the kills; sometimes from the
-            // spawn, to catch the replay of the work folders too.
-            const bool fromSpawn = random() % 4 == 0;
+            // (sanitizers) does not swallow the kills, half of those from the
+            // moment a job is in hand, so that this machine's speed does not
+            // decide what is hit; sometimes from the spawn, to catch the
+            // replay of the work folders too.
+            const bool fromSpawn = random() % 4 == 0, inHand = random() % 2 == 0;
             for (int waited = 0; !fromSpawn && waited < 10000 &&
                                  host.Err().find("serving " + folders[1]) == std::string::npos;
                  ++waited)
                 std::this_thread::sleep_for(std::chrono::milliseconds(1));
-            std::this_thread::sleep_for(
-                std::chrono::milliseconds(delayMs(random) * (fromSpawn ? 3 : 1)));
+            for (int waited = 0;
+                 !fromSpawn && inHand && waited < 8000 && AllEntries(Work(folders[0])).empty() &&
+                 AllEntries(Work(folders[1])).empty();
+                 ++waited)
+                std::this_thread::sleep_for(std::chrono::microseconds(250));
+            const int delay = delayMs(random);
+            if (!fromSpawn && inHand)
+                std::this_thread::sleep_for(std::chrono::microseconds(delay * 40));
+            else
+                std::this_thread::sleep_for(std::chrono::milliseconds(delay * (fromSpawn ? 3 : 1)));
             // The destructor kills it with SIGKILL.
         }
         for (const std::string& folder : folders)
@@ -81,7 +91,11 @@ TEST_F(ServiceTest, KilledAtAnyMomentEveryFileIsDeliveredExactlyOnce)
                 return Count(Host({"status", "--json"}).out, "\"printing\": 0,") == 2;
             },
             60000))
-            << host.Err();
+            << host.Err() << Host({"status", "--json"}).out
+            << ::testing::PrintToString(AllEntries(Work(folders[0])))
+            << ::testing::PrintToString(AllEntries(Work(folders[1])))
+            << ::testing::PrintToString(AllEntries(folders[0]))
+            << ::testing::PrintToString(AllEntries(folders[1]));
         EXPECT_EQ(Host({"stop"}).exitCode, 0);
         EXPECT_EQ(host.Wait(10000), 0) << host.Err();
     }

@@ -2,6 +2,7 @@
 // writing process is killed at an arbitrary moment.
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <chrono>
 #include <random>
 
@@ -52,11 +53,13 @@ TEST(AtomicWrite, KilledWriterLeavesOneWholeVersion)
     const std::string target = dir.File("Folder.cfg");
     const auto started = std::chrono::steady_clock::now();
     ASSERT_EQ(versions[0].Write(target), 0);
-    // Kill moments range from microseconds to a few whole writes.
+    // Kill moments range from microseconds to a few whole writes; a disk
+    // whose fsync takes seconds caps them, or the rounds would take minutes.
     const long writeMicroseconds =
-        std::max<long>(1000, std::chrono::duration_cast<std::chrono::microseconds>(
-                                 std::chrono::steady_clock::now() - started)
-                                 .count());
+        std::clamp<long>(std::chrono::duration_cast<std::chrono::microseconds>(
+                             std::chrono::steady_clock::now() - started)
+                             .count(),
+                         1000, 100000);
     std::mt19937 random(12345);
     int current = 0, changes = 0;
     for (int round = 0; round < 80; ++round)
