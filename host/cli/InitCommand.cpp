@@ -11,6 +11,7 @@
 #include "cli/CommandLine.h"
 #include "cli/CommandSupport.h"
 #include "cli/ConsoleText.h"
+#include "cli/QueueBinding.h"
 #include "folder/FileMoves.h"
 #include "module/FilterSession.h"
 #include "folder/HotFolder.h"
@@ -19,7 +20,6 @@
 #include "db/AtomicFile.h"
 #include "db/HFDatabase.h"
 #include "db/PathResolver.h"
-#include "CupsQueues.h"
 #include "ServerFromPpd.h"
 
 static const char kInitUsage[] =
@@ -38,7 +38,8 @@ static const char kInitUsage[] =
     "\n"
     "--printer QUEUE does the same with the description of the CUPS queue\n"
     "QUEUE (of the scheduler CUPS_SERVER or client.conf names) and binds the\n"
-    "folder to it: 'hotfolder run' prints there unless --submit says otherwise.\n";
+    "folder to it: the service and 'hotfolder run' print there ('hotfolder settings FOLDER\n"
+    "--printer' binds it to another queue or to none).\n";
 
 namespace
 {
@@ -95,34 +96,6 @@ bool LoadPpdServer(const std::string& ppd, ServerDescription& server, std::strin
     }
     bytes = content.str();
     return server.LoadText(xml, FromUtf8(ppd), error);
-}
-
-// The description of a CUPS queue, and its PPD's bytes when it has one.
-bool LoadQueueServer(const std::string& queue, ServerDescription& server, std::string& bytes,
-                     wxString& origin, wxString& error)
-{
-    const wxString scheduler = FromUtf8(printing::SchedulerName());
-    const wxString named = "\"" + FromUtf8(queue) + "\"";
-    wxString xml;
-    std::string reason;
-    switch (printing::QueueServerDescription(queue, xml, bytes, reason))
-    {
-    case printing::QueueLookup::Found:
-        origin = "queue " + named + " of the CUPS scheduler at " + scheduler;
-        return server.LoadText(xml, origin, error);
-    case printing::QueueLookup::UnknownQueue:
-        error = "the CUPS scheduler at " + scheduler + " has no queue " + named;
-        return false;
-    case printing::QueueLookup::Unreachable:
-        error = "cannot reach the CUPS scheduler at " + scheduler + " for the queue " + named +
-                ": " + FromUtf8(reason);
-        return false;
-    case printing::QueueLookup::Unusable:
-        break;
-    }
-    error = "the queue " + named + " of the CUPS scheduler at " + scheduler +
-            " cannot be described: " + FromUtf8(reason);
-    return false;
 }
 
 bool ParseInitRequest(const Arguments& args, InitRequest& request, int& status)
@@ -193,19 +166,6 @@ bool PrepareInit(const InitRequest& request, InitPlan& plan)
         return false;
     }
     return true;
-}
-
-// Stores a file in the folder's container. False after printing the reason.
-bool StoreBeside(const wxString& folder, const char* name, const std::string& bytes,
-                 const wxString& what)
-{
-    const wxString stored =
-        wxFileName(db::PathResolver::GetContainerFolderPath(folder), name).GetFullPath();
-    wxString reason;
-    if (db::AtomicFile::Write(stored, bytes, &reason))
-        return true;
-    PrintError("cannot store the " + what + " in " + stored + ": " + reason);
-    return false;
 }
 
 // The server description, the printer description and the queue the folder

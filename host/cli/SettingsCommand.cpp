@@ -14,6 +14,7 @@
 #include "cli/CommandLine.h"
 #include "cli/CommandSupport.h"
 #include "cli/ConsoleText.h"
+#include "cli/QueueBinding.h"
 #include "module/FilterSession.h"
 #include "module/FilterSettings.h"
 #include "folder/HotFolder.h"
@@ -23,7 +24,7 @@
 
 static const char kSettingsUsage[] =
     "usage: hotfolder settings FOLDER [--show | --set KEY=VALUE ... | --accept]\n"
-    "                          [--module PATH]\n"
+    "                          [--printer QUEUE|none] [--module PATH]\n"
     "\n"
     "Without options, opens the filter's settings panel in a window; OK stores\n"
     "the settings in the folder's Folder.cfg, Cancel leaves them alone.\n"
@@ -34,6 +35,9 @@ static const char kSettingsUsage[] =
     "             names one of the server's papers and also sets its page size,\n"
     "             imageable area and page command. Flags take 1 or 0.\n"
     "  --accept   open the window and close it with OK at once (scripts, tests)\n"
+    "  --printer  bind the folder to the CUPS queue QUEUE: its papers become the\n"
+    "             folder's server description and the service prints every\n"
+    "             output there; 'none' prints nowhere, outputs stay in Output\n"
     "\n"
     "Keys: OUTPUTFILETYPEEPS OUTPUTFILETYPEPS DEFAULTPAGESIZE CUSTOMPAGESIZE\n"
     "      IMAGEPOSITION (Top Left, Top Right, Center, Bottom Left, Bottom Right)\n"
@@ -177,10 +181,11 @@ int RunSettingsCommand(int argc, char** argv, const Arguments& args)
     if (!ParseCommandLine(args,
                           {{"--show", false, false, ""},
                            {"--set", false, true, ""},
-                           {"--accept", false, false, ""}},
+                           {"--accept", false, false, ""},
+                           {"--printer", true, false, ""}},
                           kSettingsUsage, 1, 1, parsed, status))
         return status;
-    const bool windowed = !parsed.Has("--show") && !parsed.Has("--set");
+    const bool windowed = !parsed.Has("--show") && !parsed.Has("--set") && !parsed.Has("--printer");
     std::unique_ptr<wxInitializer> initializer;
     if (!windowed)
     {
@@ -219,6 +224,20 @@ int RunSettingsCommand(int argc, char** argv, const Arguments& args)
     ServerDescription server;
     if (!OpenFolderAndServer(parsed.positionals[0], folder, server))
         return kExitSetupFailed;
+    if (parsed.Has("--printer"))
+    {
+        const std::string queue = parsed.Get("--printer");
+        if (queue == "none" ? !UnbindFolder(folder.GetFolder())
+                            : !BindFolderToQueue(folder.GetFolder(), queue))
+            return kExitSetupFailed;
+        PrintLine(queue == "none" ? folder.GetFolder() + " prints nowhere; outputs stay in " +
+                                        folder.GetDefaultOutputFolder()
+                                  : folder.GetFolder() + " prints on " + FromUtf8(queue));
+        if (!parsed.Has("--set") && !parsed.Has("--show"))
+            return kExitSuccess;
+        if (!OpenFolderAndServer(parsed.positionals[0], folder, server))
+            return kExitSetupFailed;
+    }
     const wxString modulePath = LocateFilterModule(FromUtf8(parsed.Get("--module")));
     if (windowed)
         return EditInWindow(folder, modulePath, server, parsed.Has("--accept"));

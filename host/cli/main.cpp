@@ -45,6 +45,8 @@ const Command kCommands[] = {
      "tell what the hot-folder service and each listed folder are doing", false},
     {"remove", [](int, char**, const Arguments& a) { return RunRemoveCommand(a); },
      "take a folder off the hot-folder list", false},
+    {"retry", [](int, char**, const Arguments& a) { return RunRetryCommand(a); },
+     "put failed originals back into their hot folder", false},
 };
 
 const char kUsageHead[] = "usage: hotfolder <command> [options]\n"

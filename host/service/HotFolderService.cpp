@@ -13,6 +13,7 @@
 #include <wx/filename.h>
 
 #include "cli/ExitStatus.h"
+#include "cli/ConsoleText.h"
 #include "db/PathResolver.h"
 #include "folder/FileMoves.h"
 #include "folder/HotFolder.h"
@@ -141,18 +142,22 @@ void Service::Serve(const wxString& path, Entry& entry)
     {
         m_byWatch[watch] = path;
         entry.watch = watch;
+        // Settings changed while serving apply from the next job on; watched
+        // before they are read, so a change while the folder opens counts.
+        entry.configWatch =
+            inotify_add_watch(m_inotify, db::PathResolver::GetContainerFolderPath(path).fn_str(),
+                              IN_CLOSE_WRITE | IN_MOVED_TO | IN_DELETE | IN_ONLYDIR);
+        if (entry.configWatch >= 0)
+            m_byConfigWatch[entry.configWatch] = path;
         entry.folder = ServedFolder::Open(path, m_options.folder, m_report, problem);
         if (entry.folder)
         {
-            // Settings changed while serving apply from the next job on.
-            entry.configWatch = inotify_add_watch(
-                m_inotify, db::PathResolver::GetContainerFolderPath(path).fn_str(),
-                IN_CLOSE_WRITE | IN_MOVED_TO | IN_ONLYDIR);
-            if (entry.configWatch >= 0)
-                m_byConfigWatch[entry.configWatch] = path;
             entry.problem.clear();
             if (!Single())
-                m_report.Info("serving " + path);
+                m_report.Info("serving " + path +
+                              (entry.folder->Queue().empty()
+                                   ? wxString()
+                                   : " (printing on " + FromUtf8(entry.folder->Queue()) + ")"));
             return;
         }
     }
@@ -237,7 +242,11 @@ void Service::DrainEvents()
             auto configured = m_byConfigWatch.find(event->wd);
             if (configured != m_byConfigWatch.end())
             {
-                if (name == "Folder.cfg" || name == HotFolder::kServerDescriptionName)
+                // A folder whose configuration goes is found gone by its
+                // own watch; only the queue is unbound by removing it.
+                if (name == HotFolder::kPrinterQueueName ||
+                    (!(event->mask & IN_DELETE) &&
+                     (name == "Folder.cfg" || name == HotFolder::kServerDescriptionName)))
                     m_entries[configured->second].reload = true;
                 continue;
             }

@@ -48,6 +48,8 @@ public:
 
     const wxString& Path() const { return m_folder.GetFolder(); }
     RunStatistics& Statistics() { return m_statistics; }
+    // The queue its outputs are printed on; empty when none.
+    const std::string& Queue() const { return m_places.cupsQueue; }
 
     // A name an event reported as written, renamed in or linked in.
     void Offer(const wxString& name) { m_offered.insert(name); }

@@ -144,6 +144,75 @@ TEST_F(ServicePrinting, AStoppedQueueAndACancelledJobShowAsTheSchedulerSaysThem)
     EXPECT_NE(Json().find("\"last_print_failure\": \"held.eps: cancelled on office"),
               std::string::npos)
         << Json();
+
+    // Retried, the cancelled original and one the filter failed print; a
+    // name that is no failed original is said so.
+    ASSERT_EQ(testkit::RunProgram(
+                  {cups_test::PrivateCupsd::Find("cupsenable"), "-h", cups->Server(), "office"})
+                  .exitCode,
+              0);
+    WriteFile(Failed(folder) + "/refused.eps", label);
+    const testkit::ProcessResult named = Host({"retry", folder, "held.eps", "nothing.eps"});
+    EXPECT_EQ(named.exitCode, 1);
+    EXPECT_NE(named.err.find("nothing.eps is not a failed original of " + folder),
+              std::string::npos)
+        << named.err;
+    EXPECT_NE(named.out.find("held.eps: back in the hot folder as " + folder +
+                             "/held.eps\n1 "
+                             "retried"),
+              std::string::npos)
+        << named.out;
+    const testkit::ProcessResult all = Host({"retry", folder});
+    EXPECT_EQ(all.exitCode, 0);
+    EXPECT_EQ(all.out,
+              "refused.eps: back in the hot folder as " + folder + "/refused.eps\n1 retried\n");
+    EXPECT_TRUE(WaitFor(
+        [&] {
+            return AllPrintedOnce({"held.eps", "refused.eps"});
+        },
+        20000))
+        << host->Err();
+    EXPECT_NE(ReadFile(Failed(folder) + "/failed-jobs.log")
+                  .find("held.eps\tretried: moved back into the hot folder"),
+              std::string::npos);
+    EXPECT_EQ(Host({"retry", folder}).out, "0 retried\n");
+    EXPECT_NE(Json().find("\"printed_today\": 2, \"printed_total\": 2, \"print_failed_today\": 1"),
+              std::string::npos)
+        << Json();
+}
+
+TEST_F(ServicePrinting, SettingsBindAServedFolderToAQueueAndToNone)
+{
+    const std::string folder = MakePostScriptFolder("A4", "hot");
+    auto host = Serve(1);
+    const testkit::ProcessResult unknown = Host({"settings", folder, "--printer", "nosuch"});
+    EXPECT_EQ(unknown.exitCode, 3);
+    EXPECT_NE(unknown.err.find("has no queue \"nosuch\""), std::string::npos) << unknown.err;
+    EXPECT_FALSE(Exists(Container(folder) + "/PrinterQueue.txt"));
+
+    EXPECT_EQ(Host({"settings", folder, "--printer", "office"}).out,
+              folder + " prints on office\n");
+    EXPECT_EQ(ReadFile(Container(folder) + "/PrinterQueue.txt"), "office\n");
+    EXPECT_NE(ReadFile(Container(folder) + "/server.ppd").find("*PCFileName"), std::string::npos);
+    ASSERT_TRUE(WaitFor(
+        [&] { return Count(host->Err(), "<6>serving " + folder + " (printing on office)\n"); },
+        10000))
+        << host->Err();
+    Drop(folder, "bound.eps");
+    EXPECT_TRUE(WaitFor([&] { return AllPrintedOnce({"bound.eps"}); }, 20000)) << host->Err();
+
+    const size_t unboundBefore = Count(host->Err(), "<6>serving " + folder + "\n");
+    EXPECT_EQ(Host({"settings", folder, "--printer", "none"}).exitCode, 0);
+    EXPECT_FALSE(Exists(Container(folder) + "/PrinterQueue.txt"));
+    ASSERT_TRUE(WaitFor(
+        [&] { return Count(host->Err(), "<6>serving " + folder + "\n") > unboundBefore; }, 10000))
+        << host->Err();
+    Drop(folder, "unbound.eps");
+    ASSERT_TRUE(WaitFor([&] { return Exists(Kept(folder) + "/unbound.eps"); }, 10000));
+    std::this_thread::sleep_for(std::chrono::milliseconds(300));
+    EXPECT_EQ(Jobs().count("unbound.eps"), 0u);
+    EXPECT_TRUE(Exists(folder + "/Output/unbound.ps"));
+    EXPECT_NE(Json().find("\"queue\": null"), std::string::npos) << Json();
 }
 
 TEST_F(ServicePrinting, ASchedulerAwayHoldsThePrintingAndNothingIsLostOrTwice)
