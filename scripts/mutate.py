@@ -12,12 +12,15 @@ the ctest labels that cover the changed folder and classifies the mutant:
 
 Usage:
   scripts/mutate.py [--seed N] [--per-file N] [--minutes M] [--area A ...]
-                    [--sample N] [--list] [--keep] [--results FILE]
+                    [--since REV] [--sample N] [--list] [--keep] [--results FILE]
 
   --area A      only mutate this product folder (repeatable): epsconvert,
                 plugin, db, clientapp, utils, settings_ui, sdk, host, printing,
                 posix
   --per-file N  at most N mutants drawn from each file (default 3)
+  --since REV   only mutate lines added or changed since the git revision REV
+                (what a piece of work changed), each file's share drawn from
+                those lines alone
   --sample N    at most N mutants in all, drawn evenly across the areas
   --minutes M   stop starting new mutants after M minutes (default: no limit)
   --seed N      sampling seed (default 1); the same seed and tree give the
@@ -53,7 +56,7 @@ AREAS = OrderedDict([
     ("settings_ui", ["units", "ui", "filter"]),
     ("sdk", ["frame", "units"]),
     ("host", ["host", "service"]),
-    ("printing", ["ppd"]),
+    ("printing", ["ppd", "host", "service"]),
     ("posix", ["engine", "store", "machine", "host"]),
 ])
 
@@ -215,6 +218,23 @@ def mutants_of(path, text):
     return out
 
 
+def changed_lines(rev, files):
+    """Line numbers, in today's files, of the lines added or changed since
+    rev: the '+' side of each hunk of a diff without context."""
+    diff = subprocess.run(["git", "diff", "-U0", "--no-color", rev, "--", *files], cwd=ROOT,
+                          check=True, capture_output=True, text=True,
+                          errors="surrogateescape").stdout
+    changed, path = defaultdict(set), None
+    for line in diff.splitlines():
+        if line.startswith("+++ "):
+            path = line[6:] if line.startswith("+++ b/") else None
+        elif line.startswith("@@") and path:
+            m = re.match(r"@@ -\S+ \+(\d+)(?:,(\d+))? @@", line)
+            start, count = int(m.group(1)), int(m.group(2) or 1)
+            changed[path].update(range(start, start + count))
+    return changed
+
+
 def product_files(areas):
     files = subprocess.run(["git", "ls-files", "--", *areas], cwd=ROOT, check=True,
                            capture_output=True, text=True).stdout.split()
@@ -297,6 +317,7 @@ def main():
     parser.add_argument("--sample", type=int, default=0)
     parser.add_argument("--minutes", type=float, default=0)
     parser.add_argument("--area", action="append", choices=list(AREAS))
+    parser.add_argument("--since", metavar="REV")
     parser.add_argument("--list", action="store_true")
     parser.add_argument("--keep", action="store_true")
     parser.add_argument("--results")
@@ -309,10 +330,16 @@ def main():
     areas = [a for a in (args.area or AREAS) if os.path.isdir(os.path.join(ROOT, a))]
     rng = random.Random(args.seed)
     by_area = defaultdict(list)
-    for f in sorted(product_files(areas)):
+    files = sorted(product_files(areas))
+    since = changed_lines(args.since, files) if args.since else None
+    for f in files:
+        if since is not None and f not in since:
+            continue
         with open(os.path.join(ROOT, f), encoding="utf-8", errors="surrogateescape") as fh:
             text = fh.read()
         candidates = mutants_of(f, text)
+        if since is not None:
+            candidates = [m for m in candidates if m.line in since[f]]
         rng.shuffle(candidates)
         by_area[f.split("/")[0]].extend(candidates[:args.per_file])
     for a in by_area:
