@@ -38,8 +38,8 @@ static const char kInitUsage[] =
     "\n"
     "--printer QUEUE does the same with the description of the CUPS queue\n"
     "QUEUE (of the scheduler CUPS_SERVER or client.conf names) and binds the\n"
-    "folder to it: the service and 'hotfolder run' print there ('hotfolder settings FOLDER\n"
-    "--printer' binds it to another queue or to none).\n";
+    "folder to it: the service and 'hotfolder run' print there. 'hotfolder\n"
+    "settings FOLDER --printer' binds it to another queue or to none.\n";
 
 namespace
 {

@@ -169,9 +169,14 @@ bool FolderPrinting::Trouble(const PrintRecord& print, const printing::CupsError
     return false;
 }
 
+std::chrono::milliseconds FolderPrinting::NextPause(std::chrono::milliseconds previous)
+{
+    return std::clamp(previous * 2, kFirstPause, kLongestPause);
+}
+
 void FolderPrinting::Hold(const std::string& queue, const std::string& reason)
 {
-    m_pause = std::clamp(m_pause * 2, kFirstPause, kLongestPause);
+    m_pause = NextPause(m_pause);
     m_retryAt = Clock::now() + m_pause;
     // The listing may be stale by the next try.
     m_listed.clear();

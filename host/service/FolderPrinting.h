@@ -66,6 +66,10 @@ public:
     size_t Outstanding() const { return m_journal.Prints().size(); }
     const wxString& Held() const { return m_held; }
 
+    // The pause before the next try once printing is held: the first one,
+    // then each doubled up to the longest.
+    static std::chrono::milliseconds NextPause(std::chrono::milliseconds previous);
+
 private:
     using Clock = std::chrono::steady_clock;
     // False when printing is held.

@@ -164,6 +164,26 @@ TEST_F(ServiceTest, BadInputIsReportedAndTheOthersGoOn)
                 WriteFile(path, label);
                 unlink(path.c_str());
             }
+        else if (kind == "undeliverable")
+        {
+            // A file where the output folder was (the folder aside, hidden).
+            ASSERT_EQ(rename((good + "/Output").c_str(), (good + "/.Output").c_str()), 0);
+            WriteFile(good + "/Output", "no folder");
+            WriteFile(good + "/late.eps", label);
+            EXPECT_TRUE(WaitFor(
+                [&]
+                {
+                    return host->Err().find("<3>late.eps: failed: cannot deliver the output: ") !=
+                           std::string::npos;
+                },
+                5000))
+                << host->Err();
+            EXPECT_NE(host->Err().find("; moved to " + Failed(good) + "/late.eps"),
+                      std::string::npos)
+                << host->Err();
+            unlink((good + "/Output").c_str());
+            ASSERT_EQ(rename((good + "/.Output").c_str(), (good + "/Output").c_str()), 0);
+        }
         // The good folder is served after each.
         const std::string probe = good + "/after-" + kind + ".eps";
         WriteFile(probe, label);

@@ -100,6 +100,11 @@ TEST_F(ServicePrinting, EveryDropIsOneCompletedJobNamedAfterItsOriginal)
           "\"print_failed_today\": 0",
           "\"last_print_failure\": null"})
         EXPECT_NE(Json().find(part), std::string::npos) << part << "\n" << Json();
+    EXPECT_NE(Host({"status"})
+                  .out.find("  Printer:     office, idle\n  Printing:    0 now, 20 "
+                            "printed today, 20 in total, 0 printer failure(s) today\n"),
+              std::string::npos)
+        << Host({"status"}).out;
     // The paper travels with the job to the queue's filter.
     EXPECT_NE(ReadFile(scratch + "/device.ps").find("*PageSize A4"), std::string::npos);
     EXPECT_EQ(Count(host->Err(), "<3>"), 0u) << host->Err();
