@@ -181,8 +181,34 @@ TEST_F(ServiceTest, BadInputIsReportedAndTheOthersGoOn)
             EXPECT_NE(host->Err().find("; moved to " + Failed(good) + "/late.eps"),
                       std::string::npos)
                 << host->Err();
+            EXPECT_EQ(host->Err().find("cannot write the failure log"), std::string::npos)
+                << host->Err();
             unlink((good + "/Output").c_str());
             ASSERT_EQ(rename((good + "/.Output").c_str(), (good + "/Output").c_str()), 0);
+        }
+        else if (kind == "untakeable")
+        {
+            // An append-only folder: files come in, none goes out, not even
+            // for root. Where the file system has no such flag, nothing to see.
+            struct Undo
+            {
+                std::string path;
+                ~Undo() { testkit::RunProgram({"chattr", "-a", path}); }
+            } undo{good};
+            if (testkit::RunProgram({"chattr", "+a", good}).exitCode != 0)
+                continue;
+            WriteFile(good + "/stuck.eps", label);
+            EXPECT_TRUE(WaitFor(
+                [&]
+                {
+                    return host->Err().find("<3>cannot take " + good +
+                                            "/stuck.eps: Operation not permitted") !=
+                           std::string::npos;
+                },
+                5000))
+                << host->Err();
+            testkit::RunProgram({"chattr", "-a", good});
+            unlink((good + "/stuck.eps").c_str());
         }
         // The good folder is served after each.
         const std::string probe = good + "/after-" + kind + ".eps";
