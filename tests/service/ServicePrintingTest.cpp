@@ -120,6 +120,14 @@ TEST_F(ServicePrinting, AStoppedQueueAndACancelledJobShowAsTheSchedulerSaysThem)
     auto host = Serve(1);
     Drop(folder, "held.eps");
     ASSERT_TRUE(WaitFor([&] { return Jobs().count("held.eps"); }, 10000)) << host->Err();
+    // The job waits at the stopped queue: one of its open jobs.
+    std::map<std::string, std::vector<printing::JobState>> marked;
+    std::set<int> open;
+    printing::CupsError error;
+    ASSERT_TRUE(printing::ListMarkedJobs("office", marked, error)) << error.reason;
+    ASSERT_TRUE(printing::OpenJobIds("office", open, error)) << error.reason;
+    ASSERT_EQ(marked.size(), 1u);
+    EXPECT_EQ(open, std::set<int>{marked.begin()->second.at(0).id});
     const std::string json = Json();
     for (const char* part :
          {"\"queue_state\": \"stopped\"", "\"queue_reasons\": [\"paused\"]", "\"printing\": 1"})
