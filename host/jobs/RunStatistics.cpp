@@ -7,7 +7,6 @@ void RunStatistics::Add(const RunStatistics& other)
     done += other.done;
     failed += other.failed;
     refused += other.refused;
-    printed += other.printed;
     notPrinted += other.notPrinted;
     sniffSeconds += other.sniffSeconds;
     processSeconds += other.processSeconds;

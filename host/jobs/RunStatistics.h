@@ -11,7 +11,6 @@ public:
     size_t done = 0;
     size_t failed = 0;
     size_t refused = 0;
-    size_t printed = 0;        // jobs the printer completed
     size_t notPrinted = 0;     // delivered, but the printer refused, aborted or cancelled them
     double sniffSeconds = 0;   // inside SniffFolder
     double processSeconds = 0; // inside Process

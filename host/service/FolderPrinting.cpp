@@ -249,11 +249,8 @@ void FolderPrinting::End(const PrintRecord& print, printing::JobEnd end, const s
                        FromUtf8(print.queue), wxString::Format("%d", print.schedulerJob),
                        print.jobName, print.id, FromUtf8(reasons)});
         if (end == printing::JobEnd::Completed)
-        {
-            ++m_statistics.printed;
             m_report.Info(wxString::Format("%s: printed on %s (CUPS job %d)", print.jobName,
                                            FromUtf8(print.queue), print.schedulerJob));
-        }
         else
         {
             ++m_statistics.notPrinted;
