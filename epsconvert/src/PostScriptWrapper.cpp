@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "posix/CLocale.h"
+#include "posix/OutsideText.h"
 
 namespace
 {
@@ -91,14 +92,17 @@ std::string FormatWrapperHeader(const char* docName, const char* creationDate,
                                 const PageLayout& layout, const char* setPageDevice)
 {
     const PageLayout& l = layout;
-    return Format(kHeaderTemplate, docName, creationDate, Printable(std::floor(l.left)),
+    // The name is the dropper's text: it must not end the comment line.
+    const std::string title = posix::DscCommentValue("%%Title: ", docName);
+    const std::string document = posix::DscCommentValue("%%BeginDocument: ", docName);
+    return Format(kHeaderTemplate, title.c_str(), creationDate, Printable(std::floor(l.left)),
                   Printable(std::floor(l.bottom)), Printable(std::ceil(l.right)),
                   Printable(std::ceil(l.top)), Printable(l.left), Printable(l.bottom),
                   Printable(l.right), Printable(l.top), l.rotated ? "Landscape" : "Portrait",
                   l.rotated ? 1 : 0, setPageDevice ? setPageDevice : kNoSetPageDevice,
                   Printable(l.translateX), Printable(l.translateY), Printable(l.angle),
                   Printable(l.scaleX), Printable(l.scaleY), Printable(l.originX),
-                  Printable(l.originY), docName);
+                  Printable(l.originY), document.c_str());
 }
 
 const char* WrapperTrailer()
