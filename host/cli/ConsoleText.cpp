@@ -3,6 +3,8 @@
 #include <cstdio>
 #include <unistd.h>
 
+#include "posix/NativePath.h"
+
 std::string ToUtf8(const wxString& text)
 {
     const wxScopedCharBuffer buffer = text.utf8_str();
@@ -17,7 +19,8 @@ wxString FromUtf8(const std::string& text)
 void PrintError(const wxString& message)
 {
     std::fflush(stdout);
-    std::fprintf(stderr, "hotfolder: %s\n", ToUtf8(message).c_str());
+    // One line whatever names the message quotes.
+    std::fprintf(stderr, "hotfolder: %s\n", ToUtf8(posix::ShownLine(message)).c_str());
     std::fflush(stderr);
 }
 

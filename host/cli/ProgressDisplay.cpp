@@ -4,13 +4,14 @@
 #include <cstdio>
 
 #include "cli/ConsoleText.h"
+#include "posix/NativePath.h"
 
 void ProgressDisplay::BeginJob(size_t index, size_t total, const wxString& name)
 {
     m_index = index;
     m_total = total;
     m_percent = 0;
-    m_name = name;
+    m_name = posix::ShownLine(name);
     if (m_terminal)
         Draw();
 }
@@ -29,14 +30,14 @@ void ProgressDisplay::EndJob(const wxString& outcome)
         Note(outcome);
         return;
     }
-    PrintLine(wxString::Format("[%zu/%zu] %s", m_index + 1, m_total, outcome));
+    PrintLine(wxString::Format("[%zu/%zu] %s", m_index + 1, m_total, posix::ShownLine(outcome)));
     std::fflush(stdout);
 }
 
 void ProgressDisplay::Note(const wxString& line)
 {
     ClearBar();
-    PrintLine(line);
+    PrintLine(posix::ShownLine(line));
     std::fflush(stdout);
 }
 

@@ -7,6 +7,7 @@
 
 #include "cli/Commands.h"
 #include "cli/ConsoleText.h"
+#include "posix/NativePath.h"
 #include "service/ServiceCommands.h"
 
 namespace
@@ -102,7 +103,10 @@ int main(int argc, char** argv)
     }
     const Arguments args(argv + 2, argv + argc);
     if (command->needsGuiToolkit)
+    {
+        posix::KeepFileNameBytes();
         return command->run(argc, argv, args);
+    }
 
     wxInitializer initializer(argc, argv);
     if (!initializer.IsOk())
@@ -110,5 +114,6 @@ int main(int argc, char** argv)
         PrintError("cannot initialise wxWidgets");
         return kExitSetupFailed;
     }
+    posix::KeepFileNameBytes();
     return command->run(argc, argv, args);
 }

@@ -13,6 +13,7 @@
 #include "folder/FileMoves.h"
 #include "folder/HotFolder.h"
 #include "jobs/JobPlaces.h"
+#include "posix/NativePath.h"
 #include "service/FailureLog.h"
 
 namespace
@@ -29,14 +30,14 @@ bool IsRegularFile(const std::string& path)
 std::map<std::string, bool> LastFailedAtThePrinter(const wxString& failedFolder)
 {
     std::map<std::string, bool> atThePrinter;
-    std::ifstream log(ToUtf8(wxFileName(failedFolder, kFailureLogName).GetFullPath()));
+    std::ifstream log(posix::NativePath(wxFileName(failedFolder, kFailureLogName).GetFullPath()));
     for (std::string line; std::getline(log, line);)
     {
         const size_t name = line.find('\t');
         const size_t reason = name == std::string::npos ? name : line.find('\t', name + 1);
         if (reason == std::string::npos)
             continue;
-        atThePrinter[line.substr(name + 1, reason - name - 1)] =
+        atThePrinter[ReadLogField(line.substr(name + 1, reason - name - 1))] =
             line.compare(reason + 1, 8, "printer:") == 0;
     }
     return atThePrinter;
@@ -47,23 +48,25 @@ std::vector<FailedOriginal> ListFailedOriginals(const HotFolder& folder)
 {
     std::vector<FailedOriginal> originals;
     const wxString failedFolder = folder.GetFailedFolder();
-    if (DIR* dir = opendir(ToUtf8(failedFolder).c_str()))
+    if (DIR* dir = opendir(posix::NativePath(failedFolder).c_str()))
     {
         while (const dirent* entry = readdir(dir))
         {
             const std::string name = entry->d_name;
-            const std::string path = ToUtf8(failedFolder) + "/" + name;
+            const std::string path = posix::NativePath(failedFolder) + "/" + name;
             // Hidden names are moves in progress; the log is not an original.
             if (name[0] != '.' && name != kFailureLogName && IsRegularFile(path))
-                originals.push_back({FromUtf8(name), FromUtf8(path), false});
+                originals.push_back({posix::FromNativePath(name.c_str()),
+                                     posix::FromNativePath(path.c_str()), false});
         }
         closedir(dir);
     }
-    const std::string kept = ToUtf8(folder.GetKeptOriginalsFolder());
+    const std::string kept = posix::NativePath(folder.GetKeptOriginalsFolder());
     for (const auto& last : LastFailedAtThePrinter(failedFolder))
         if (last.second && last.first.find('/') == std::string::npos &&
             IsRegularFile(kept + "/" + last.first))
-            originals.push_back({FromUtf8(last.first), FromUtf8(kept + "/" + last.first), true});
+            originals.push_back({posix::FromNativePath(last.first.c_str()),
+                                 posix::FromNativePath((kept + "/" + last.first).c_str()), true});
     std::sort(originals.begin(), originals.end(),
               [](const FailedOriginal& a, const FailedOriginal& b) { return a.name < b.name; });
     return originals;

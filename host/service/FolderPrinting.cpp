@@ -12,6 +12,7 @@
 #include "jobs/JobPlaces.h"
 #include "jobs/JobReport.h"
 #include "jobs/RunStatistics.h"
+#include "posix/NativePath.h"
 #include "printing/CupsForwarding.h"
 #include "service/FailureLog.h"
 
@@ -98,7 +99,8 @@ bool FolderPrinting::SubmitOne(const PrintRecord& print)
         return true;
     }
     printing::CupsError error;
-    const std::string title = ToUtf8(print.jobName);
+    // The printer shows the job's name (queue lists, banner pages): shown text.
+    const std::string title = ToUtf8(posix::ShownLine(print.jobName));
     const int job = printing::CreateMarkedJob(
         print.queue, title, TicketOptions(print.output + kTicketSuffix), ToUtf8(print.id), error);
     if (job == 0)
@@ -109,7 +111,7 @@ bool FolderPrinting::SubmitOne(const PrintRecord& print)
     }
     // Not synced: lost only with a power cut, and then the marker finds the job.
     m_journal.Append({FolderJournal::Job(print.id, job)}, false);
-    if (!printing::SendJobDocument(print.queue, job, title, ToUtf8(print.output), error))
+    if (!printing::SendJobDocument(print.queue, job, title, posix::NativePath(print.output), error))
     {
         printing::CupsError ignored;
         printing::CancelJob(print.queue, job, ignored);
@@ -233,7 +235,7 @@ bool FolderPrinting::AlreadyLogged(const wxString& id)
             if (at == std::string::npos)
                 continue;
             const size_t end = line.find('\t', at + 1);
-            m_loggedIds.insert(FromUtf8(line.substr(at + 1, end - at - 1)));
+            m_loggedIds.insert(LogFieldText(line.substr(at + 1, end - at - 1)));
         }
     }
     return m_loggedIds.count(id) != 0;

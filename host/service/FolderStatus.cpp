@@ -20,6 +20,7 @@
 #include "jobs/JobPlaces.h"
 #include "module/FilterSettings.h"
 #include "service/FolderJournal.h"
+#include "service/FailureLog.h"
 #include "service/FolderPrinting.h"
 
 namespace
@@ -99,11 +100,12 @@ void CountFailed(const wxString& directory, FolderStatus& status)
     const size_t tab = last.find('\t');
     if (tab != std::string::npos)
     {
-        std::string rest = last.substr(tab + 1);
+        const std::string rest = last.substr(tab + 1);
         const size_t second = rest.find('\t');
-        if (second != std::string::npos)
-            rest.replace(second, 1, ": ");
-        status.lastFailure = FromUtf8(rest);
+        status.lastFailure = second == std::string::npos
+                                 ? LogFieldText(rest)
+                                 : LogFieldText(rest.substr(0, second)) + ": " +
+                                       LogFieldText(rest.substr(second + 1));
     }
 }
 // printed-jobs.log: time, verdict, queue, job id, name, work id, reason.
@@ -132,9 +134,10 @@ void CountPrinted(const wxString& container, FolderStatus& status)
         }
         status.printFailedToday += isToday;
         status.lastPrintFailure =
-            FromUtf8(fields[4] + ": " + fields[1] + " on " + fields[2] +
-                     (fields[3] != "0" ? " (CUPS job " + fields[3] + ")" : "") +
-                     (fields[6].empty() ? "" : ": " + fields[6]));
+            LogFieldText(fields[4]) + ": " + LogFieldText(fields[1]) + " on " +
+            LogFieldText(fields[2]) +
+            (fields[3] != "0" ? " (CUPS job " + LogFieldText(fields[3]) + ")" : wxString()) +
+            (fields[6].empty() ? wxString() : ": " + LogFieldText(fields[6]));
     }
 }
 

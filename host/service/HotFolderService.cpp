@@ -14,6 +14,7 @@
 
 #include "cli/ExitStatus.h"
 #include "cli/ConsoleText.h"
+#include "posix/NativePath.h"
 #include "db/PathResolver.h"
 #include "folder/FileMoves.h"
 #include "folder/HotFolder.h"
@@ -218,7 +219,7 @@ void Service::DrainEvents()
         {
             const auto* event = reinterpret_cast<const struct inotify_event*>(at);
             at += sizeof(struct inotify_event) + event->len;
-            const wxString name = event->len ? wxString(event->name, *wxConvFileName) : wxString();
+            const wxString name = event->len ? posix::FromNativePath(event->name) : wxString();
             if (event->mask & IN_Q_OVERFLOW)
             {
                 // Events were lost: look at everything again.

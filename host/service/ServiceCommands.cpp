@@ -12,6 +12,7 @@
 #include "db/HFDatabase.h"
 #include "db/PathResolver.h"
 #include "module/ModuleLocator.h"
+#include "posix/NativePath.h"
 #include "service/FolderStatus.h"
 #include "service/HotFolderListEntries.h"
 #include "service/HotFolderService.h"
@@ -114,8 +115,11 @@ int RunStopCommand(const Arguments& args)
     return kExitSuccess;
 }
 
-static wxString JsonText(const wxString& text)
+static wxString JsonText(const wxString& raw)
 {
+    // Shown text first: JSON needs UTF-8, and a reader gets a name back with
+    // ReadShownText as from every log.
+    const wxString text = posix::ShownLine(raw);
     wxString quoted = "\"";
     for (wxUniChar c : text)
     {

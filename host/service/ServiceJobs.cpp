@@ -14,6 +14,7 @@
 #include <wx/filename.h>
 
 #include "cli/ConsoleText.h"
+#include "posix/NativePath.h"
 #include "folder/FileMoves.h"
 #include "jobs/JobExecution.h"
 #include "jobs/RunStatistics.h"
@@ -71,7 +72,7 @@ std::vector<wxString> EntryNames(const wxString& directory)
     {
         while (struct dirent* entry = readdir(dir))
             if (std::strcmp(entry->d_name, ".") != 0 && std::strcmp(entry->d_name, "..") != 0)
-                names.push_back(wxString(entry->d_name, *wxConvFileName));
+                names.push_back(posix::FromNativePath(entry->d_name));
         closedir(dir);
     }
     return names;

@@ -4,15 +4,14 @@
 #include <unistd.h>
 
 #include "cli/ConsoleText.h"
+#include "posix/NativePath.h"
 
 void ServiceLog(Severity severity, const wxString& message)
 {
     static const bool terminal = isatty(STDERR_FILENO) == 1;
-    wxString line = message;
-    // A line break inside a message would become a second entry without a
-    // severity.
-    line.Replace("\n", " ");
-    std::string text = ToUtf8(line);
+    // Names in a message are outside text: a line break in one would forge a
+    // second entry.
+    const std::string text = ToUtf8(posix::ShownLine(message));
     if (terminal)
         std::fprintf(stderr, "hotfolder: %s\n", text.c_str());
     else
