@@ -11,6 +11,7 @@
 #include "cli/CommandLine.h"
 #include "cli/CommandSupport.h"
 #include "cli/ConsoleText.h"
+#include "service/FolderAccess.h"
 #include "cli/QueueBinding.h"
 #include "folder/FileMoves.h"
 #include "module/FilterSession.h"
@@ -234,6 +235,8 @@ int ExecuteInit(const InitRequest& request, InitPlan& plan)
         PrintError("cannot write the folder configuration " + plan.configFile);
         return kExitSetupFailed;
     }
+    // The service serves only a container no one but its owner may change.
+    KeepToTheOwner(folder);
     // The list's writer makes only the last level of the warehouse.
     wxString ignored;
     MakeDirectories(db::PathResolver::GetWarehousePath(), ignored);

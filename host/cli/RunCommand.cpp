@@ -7,6 +7,7 @@
 #include "cli/CommandLine.h"
 #include "cli/CommandSupport.h"
 #include "cli/ConsoleText.h"
+#include "posix/ActingUser.h"
 #include "cli/ProgressDisplay.h"
 #include "db/PathResolver.h"
 #include "folder/FileMoves.h"
@@ -174,8 +175,27 @@ int PreparePlaces(const RunRequest& request, RunSetup& setup)
 // Opens the folder and makes its places. Returns the exit status.
 int PrepareRun(const RunRequest& request, RunSetup& setup)
 {
+    // Run as root, what it makes in a user's folder it makes as the owner
+    // would (a missing folder has no owner: opening it says so).
+    posix::UserIdentity owner;
+    std::string ignored;
+    posix::OwnerOf(request.folder, owner, ignored);
+    const posix::ActingAs acting(owner);
+    if (!acting.Acting())
+    {
+        PrintError(FromUtf8(acting.Error()));
+        return kExitSetupFailed;
+    }
     if (!OpenFolderAndServer(request.folder, setup.folder, setup.server))
         return kExitSetupFailed;
+    wxString moved, error;
+    if (!setup.folder.FollowMove(moved, error))
+    {
+        PrintError(error);
+        return kExitSetupFailed;
+    }
+    if (!moved.empty())
+        PrintError(moved);
     return PreparePlaces(request, setup);
 }
 

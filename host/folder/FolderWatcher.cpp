@@ -46,7 +46,7 @@ void FolderWatcher::Wait(int timeoutMs)
 bool FileSignature(const wxString& path, long long& size, long long& mtimeNs)
 {
     struct stat info;
-    if (stat(path.fn_str(), &info) != 0)
+    if (lstat(path.fn_str(), &info) != 0) // a link by itself, not what it points to
         return false;
     size = info.st_size;
     mtimeNs = static_cast<long long>(info.st_mtim.tv_sec) * 1000000000LL + info.st_mtim.tv_nsec;
@@ -87,7 +87,8 @@ std::vector<wxString> ListFolderFiles(const wxString& folder)
             continue;
         wxString path = wxFileName(folder, posix::FromNativePath(entry->d_name)).GetFullPath();
         struct stat info;
-        if (stat(path.fn_str(), &info) == 0 && S_ISREG(info.st_mode))
+        // Links too, so that they are refused with the reason.
+        if (lstat(path.fn_str(), &info) == 0 && (S_ISREG(info.st_mode) || S_ISLNK(info.st_mode)))
             files.push_back(path);
     }
     std::sort(files.begin(), files.end());

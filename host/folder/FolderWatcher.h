@@ -47,9 +47,10 @@ private:
     std::map<wxString, Seen> m_files;
 };
 
-// Regular, visible files directly in folder, sorted by name.
+// Regular files and symbolic links (to be refused), visible, directly in
+// folder, sorted by name.
 std::vector<wxString> ListFolderFiles(const wxString& folder);
 
-// Size and modification time of a file, for telling a changed file from the
+// Size and modification time of a file (of a link itself), for telling a changed file from the
 // one seen before; false when it is gone.
 bool FileSignature(const wxString& path, long long& size, long long& mtimeNs);

@@ -140,3 +140,47 @@ bool HotFolder::SaveFilter(const wxXmlNode& filter, wxString& error)
     m_filters = filters;
     return true;
 }
+
+static wxString WithoutTrailingSlash(wxString path)
+{
+    while (path.length() > 1 && path.EndsWith("/"))
+        path.RemoveLast();
+    return path;
+}
+
+bool HotFolder::FollowMove(wxString& note, wxString& error)
+{
+    note.clear();
+    const wxString recorded = WithoutTrailingSlash(m_folders.GetHotFolder());
+    struct stat old, now;
+    if (recorded.empty() || recorded == m_folder ||
+        (stat(recorded.fn_str(), &old) == 0 && stat(m_folder.fn_str(), &now) == 0 &&
+         old.st_dev == now.st_dev && old.st_ino == now.st_ino)) // another name, same folder
+        return true;
+    // Only what lay under the old place moves along; a folder elsewhere is
+    // where its owner put it.
+    const auto follow = [&](const wxString& path)
+    {
+        wxString rest;
+        return path.StartsWith(recorded + "/", &rest) ? m_folder + "/" + rest : path;
+    };
+    db::FolderConfiguration folders = m_folders;
+    folders.SetFailFolder(follow(m_folders.GetFailFolder()));
+    folders.SetWorkFolder(follow(m_folders.GetWorkFolder()));
+    folders.SetBackupFolder(follow(m_folders.GetBackupFolder()));
+    folders.SetHotFolder(m_folder);
+    wxString saved;
+    if (db::HFDatabase::WriteFolderProperties(m_configFile, m_setting, m_jobs, folders, m_filters,
+                                              m_impose, m_preflight, saved) != 0)
+    {
+        error = wxString::Format("the folder was moved from %s, and its configuration %s cannot "
+                                 "be rewritten for its new place",
+                                 recorded, m_configFile);
+        return false;
+    }
+    m_folders = folders;
+    note = m_folder + " was moved from " + recorded +
+           ": its work, failed and kept-originals folders follow it, and " + m_configFile +
+           " says so now";
+    return true;
+}

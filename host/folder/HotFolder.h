@@ -53,6 +53,13 @@ public:
     // element of the same name; everything else is written back as read.
     bool SaveFilter(const wxXmlNode& filter, wxString& error);
 
+    // When Folder.cfg names another place as the hot folder (the folder was
+    // moved or renamed), its work, failed and kept-originals folders that lay
+    // under the old place are taken to lie under this one, and Folder.cfg is
+    // rewritten so. note says so (empty when nothing moved); false with a
+    // reason when the configuration cannot be written.
+    bool FollowMove(wxString& note, wxString& error);
+
 private:
     wxString m_folder;
     wxString m_configFile;

@@ -5,19 +5,58 @@
 #include <cstdlib>
 #include <cstring>
 #include <dirent.h>
+#include <csignal>
 #include <fcntl.h>
 #include <string>
 #include <sys/stat.h>
 #include <unistd.h>
 
-// Why a scan of /proc and not a file lease: a lease may be taken only by the
-// file's owner or with CAP_LEASE, is refused on some file systems (and on
-// overlay mounts in older kernels), and breaking one would stall the writer.
-// The scan sees every writer on this machine that the service may inspect;
-// run as the system service (root) that is every local process. A writer on
-// another machine (network file systems) is invisible to both; for those the
-// settle time stays the fallback. The scan is one pass for a whole batch of
-// candidates, so a burst costs one walk of /proc, not one per file.
+// First a read lease: the kernel refuses one while any descriptor of the
+// file, whoever holds it, is open for writing, so it sees a writer of
+// another user (a file share writes as the connected user) without the
+// right to look into other users' processes. Taking it needs the file's
+// owner or CAP_LEASE, which the service keeps for this. The lease is given
+// back at once; a writer that opens the file meanwhile waits that long, and
+// the break signal it would send is ignored.
+// Where no lease can be taken (file systems without leases, a caller that
+// neither owns the file nor has CAP_LEASE), a scan of /proc: it sees the
+// writers among the processes the caller may inspect, one pass for a whole
+// batch. A writer on another machine (network file systems) is invisible to
+// both; for those the settle time stays the fallback.
+namespace
+{
+enum class Writers
+{
+    None,
+    Some,
+    Unknown
+};
+
+Writers ProbeByLease(const std::string& path, const FileIdentity& identity)
+{
+    static const bool breakSignalIgnored = (signal(SIGIO, SIG_IGN), true);
+    (void)breakSignalIgnored;
+    // Never follows a link, never waits on a FIFO, never becomes a terminal.
+    const int fd = open(path.c_str(), O_RDONLY | O_NONBLOCK | O_NOFOLLOW | O_NOCTTY | O_CLOEXEC);
+    if (fd < 0)
+        return Writers::Unknown;
+    struct stat info;
+    Writers writers = Writers::Unknown;
+    if (fstat(fd, &info) == 0 && S_ISREG(info.st_mode) &&
+        FileIdentity(info.st_dev, info.st_ino) == identity)
+    {
+        if (fcntl(fd, F_SETLEASE, F_RDLCK) == 0)
+        {
+            fcntl(fd, F_SETLEASE, F_UNLCK);
+            writers = Writers::None;
+        }
+        else if (errno == EAGAIN)
+            writers = Writers::Some;
+    }
+    close(fd);
+    return writers;
+}
+} // namespace
 
 static bool OpenForWriting(int fdinfoDirectory, const char* fdName)
 {
@@ -38,7 +77,7 @@ static bool OpenForWriting(int fdinfoDirectory, const char* fdName)
     return access == O_WRONLY || access == O_RDWR;
 }
 
-std::set<FileIdentity> FindFilesOpenForWriting(const std::set<FileIdentity>& files)
+static std::set<FileIdentity> ScanForWriters(const std::set<FileIdentity>& files)
 {
     std::set<FileIdentity> writing;
     if (files.empty())
@@ -85,5 +124,25 @@ std::set<FileIdentity> FindFilesOpenForWriting(const std::set<FileIdentity>& fil
         closedir(descriptors);
     }
     closedir(processes);
+    return writing;
+}
+
+std::set<FileIdentity> FindFilesOpenForWriting(const std::map<FileIdentity, std::string>& files)
+{
+    std::set<FileIdentity> writing, unknown;
+    for (const auto& [identity, path] : files)
+        switch (ProbeByLease(path, identity))
+        {
+        case Writers::Some:
+            writing.insert(identity);
+            break;
+        case Writers::Unknown:
+            unknown.insert(identity);
+            break;
+        case Writers::None:
+            break;
+        }
+    for (const FileIdentity& identity : ScanForWriters(unknown))
+        writing.insert(identity);
     return writing;
 }

@@ -5,10 +5,13 @@
 
 #include <wx/filename.h>
 
+#include "cli/ConsoleText.h"
 #include "db/PathResolver.h"
 #include "folder/FileMoves.h"
 #include "folder/ServerDescription.h"
 #include "module/FilterSession.h"
+#include "posix/NativePath.h"
+#include "service/FolderAccess.h"
 #include "service/OpenWriters.h"
 #include "jobs/JobReport.h"
 
@@ -16,9 +19,27 @@ std::unique_ptr<ServedFolder> ServedFolder::Open(const wxString& path, const Fol
                                                  JobReport& report, wxString& error)
 {
     std::unique_ptr<ServedFolder> served(new ServedFolder(options, report));
-    HotFolder& folder = served->m_folder;
-    if (!folder.Open(path, error))
+    std::string why;
+    if (!posix::OwnerOf(posix::NativePath(path), served->m_owner, why))
+    {
+        error = "cannot find the owner of " + path + ": " + FromUtf8(why);
         return nullptr;
+    }
+    if (!OnlyTheOwnerCanSteer(path, served->m_owner, error))
+        return nullptr;
+    // From here on everything is done as the owner would do it.
+    const posix::ActingAs acting(served->m_owner);
+    if (!acting.Acting())
+    {
+        error = FromUtf8(acting.Error());
+        return nullptr;
+    }
+    HotFolder& folder = served->m_folder;
+    wxString moved;
+    if (!folder.Open(path, error) || !folder.FollowMove(moved, error))
+        return nullptr;
+    if (!moved.empty())
+        report.Warning(moved);
     const wxString container = db::PathResolver::GetContainerFolderPath(folder.GetFolder());
     // Before anything in the folder is touched: one process at a time.
     if (!served->m_lock.Acquire(container, options.holder, error))
@@ -67,12 +88,14 @@ ServedFolder::~ServedFolder() = default;
 
 void ServedFolder::OfferAll()
 {
+    const posix::ActingAs acting(m_owner);
     for (const wxString& path : ListFolderFiles(Path()))
         m_offered.insert(wxFileName(path).GetFullName());
 }
 
 bool ServedFolder::Rescan()
 {
+    const posix::ActingAs acting(m_owner);
     struct stat info;
     if (stat(Path().fn_str(), &info) != 0 || !S_ISDIR(info.st_mode))
         return false;
@@ -99,6 +122,12 @@ void ServedFolder::SetAside(const wxString& path)
 
 size_t ServedFolder::TakeOffered(size_t limit, const std::function<bool()>& stop)
 {
+    const posix::ActingAs acting(m_owner);
+    if (!acting.Acting())
+    {
+        m_report.Error(Path() + ": " + FromUtf8(acting.Error()));
+        return 0;
+    }
     const size_t run = TakeBatch(limit, stop);
     if (m_offered.empty())
         m_jobs->ReleaseSpares();
@@ -107,13 +136,18 @@ size_t ServedFolder::TakeOffered(size_t limit, const std::function<bool()>& stop
 
 void ServedFolder::Print(const std::function<bool()>& stop)
 {
+    const posix::ActingAs acting(m_owner);
+    if (!acting.Acting())
+        return;
     m_printing->Submit(stop);
     m_printing->Follow();
 }
 
 size_t ServedFolder::TakeBatch(size_t limit, const std::function<bool()>& stop)
 {
-    // Regular, visible files only: a FIFO or a device is never opened.
+    // Regular, visible files only: a FIFO or a device is never opened, and
+    // a symbolic link is refused (it would make the folder's owner read
+    // whatever it points to on the dropper's behalf).
     std::map<FileIdentity, wxString> candidates;
     while (!m_offered.empty() && candidates.size() < limit)
     {
@@ -123,15 +157,24 @@ size_t ServedFolder::TakeBatch(size_t limit, const std::function<bool()>& stop)
             continue;
         const wxString path = wxFileName(Path(), name).GetFullPath();
         struct stat info;
-        if (stat(path.fn_str(), &info) != 0 || !S_ISREG(info.st_mode) || IsSetAside(path))
+        if (lstat(path.fn_str(), &info) != 0 || IsSetAside(path))
+            continue;
+        if (S_ISLNK(info.st_mode))
+        {
+            ++m_statistics.refused;
+            SetAside(path);
+            m_report.Warning(name + " is a symbolic link; the hot folder takes files only");
+            continue;
+        }
+        if (!S_ISREG(info.st_mode))
             continue;
         candidates[FileIdentity(info.st_dev, info.st_ino)] = path;
     }
     if (candidates.empty())
         return 0;
-    std::set<FileIdentity> identities;
+    std::map<FileIdentity, std::string> identities;
     for (const auto& candidate : candidates)
-        identities.insert(candidate.first);
+        identities[candidate.first] = posix::NativePath(candidate.second);
     // A file still open for writing is left for its writer's close event
     // (or, without one, the rescan).
     for (const FileIdentity& open : FindFilesOpenForWriting(identities))

@@ -13,6 +13,7 @@
 #include "jobs/JobPlaces.h"
 #include "jobs/RunStatistics.h"
 #include "module/FilterSession.h"
+#include "posix/ActingUser.h"
 #include "service/FolderJournal.h"
 #include "service/FolderLock.h"
 #include "service/FolderPrinting.h"
@@ -78,6 +79,8 @@ private:
 
     FolderOptions m_options;
     JobReport& m_report;
+    // The folder's owner, whose rights its work is done with.
+    posix::UserIdentity m_owner;
     FolderLock m_lock;
     HotFolder m_folder;
     JobPlaces m_places;

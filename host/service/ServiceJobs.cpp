@@ -193,6 +193,16 @@ JobOutcome ServiceJobs::Run(const ReadyToProcessJobInfo& job)
         Retire(id);
         return JobOutcome::Failed;
     }
+    // What was checked in the hot folder may have been swapped for a link
+    // since; in the work folder no dropper can swap it again.
+    for (const wxString& file : claimed.files)
+    {
+        struct stat info;
+        if (lstat(Native(file).c_str(), &info) != 0 || !S_ISREG(info.st_mode))
+            return Fail(id, job.jobName,
+                        wxFileName(file).GetFullName() +
+                            " is a symbolic link; the hot folder takes files only");
+    }
     return Continue(id, claimed);
 }
 

@@ -90,3 +90,21 @@ TEST_F(HostNames, ShownInEveryLineReadBackAndNeverRun)
     }
     EXPECT_EQ(outputs, names.size());
 }
+
+TEST_F(HostNames, AMovedFolderTakesItsPlacesAlongAndNothingIsMadeWhereItWas)
+{
+    const std::string old = MakePostScriptFolder("A4", "before");
+    const std::string moved = scratch + "/after";
+    ASSERT_EQ(rename(old.c_str(), moved.c_str()), 0);
+    CopyExample("label.eps", moved);
+    const testkit::ProcessResult first = Host({"run", moved});
+    EXPECT_EQ(first.exitCode, 0) << first.err;
+    EXPECT_NE(first.err.find(moved + " was moved from " + old), std::string::npos) << first.err;
+    EXPECT_FALSE(Exists(old));
+    EXPECT_TRUE(Exists(Kept(moved) + "/label.eps"));
+    const std::string config = ReadFile(Container(moved) + "/Folder.cfg");
+    EXPECT_EQ(config.find(old + "/"), std::string::npos) << config;
+    EXPECT_NE(config.find("<Hotfolder path=\"" + moved + "\"/>"), std::string::npos) << config;
+    const testkit::ProcessResult second = Host({"run", moved});
+    EXPECT_EQ(second.err.find("was moved"), std::string::npos) << second.err;
+}
