@@ -4,7 +4,7 @@
 set(HF_FUZZ_DIR ${CMAKE_CURRENT_LIST_DIR})
 set(HF_FUZZ_TARGETS
   is_this_eps eps_wrapper server_description folder_config
-  preferences_file hotfolder_list client_config preference_node)
+  preferences_file hotfolder_list client_config preference_node folder_journal shown_text)
 
 # `cmake -DHF_PRINT_FUZZ_TARGETS=ON -P FuzzTargets.cmake` prints the list for
 # scripts/fuzz.sh.
@@ -16,7 +16,7 @@ endif()
 
 # The engine's targets run without the toolkit; every other one also takes
 # the toolkit half of the support code.
-set(HF_FUZZ_ENGINE_TARGETS is_this_eps eps_wrapper)
+set(HF_FUZZ_ENGINE_TARGETS is_this_eps eps_wrapper shown_text)
 foreach(name ${HF_FUZZ_TARGETS})
   if(name IN_LIST HF_FUZZ_ENGINE_TARGETS)
     set(HF_FUZZ_${name}_SUPPORT ${HF_FUZZ_DIR}/support/FuzzSupport.cpp)
@@ -42,3 +42,7 @@ set(HF_FUZZ_client_config_SOURCE ClientConfigFuzzer.cpp)
 set(HF_FUZZ_client_config_LIBS hf_utils)
 set(HF_FUZZ_preference_node_SOURCE PreferenceNodeFuzzer.cpp)
 set(HF_FUZZ_preference_node_LIBS hf_plugin)
+set(HF_FUZZ_folder_journal_SOURCE FolderJournalFuzzer.cpp)
+set(HF_FUZZ_folder_journal_LIBS hf_host_core)
+set(HF_FUZZ_shown_text_SOURCE ShownTextFuzzer.cpp)
+set(HF_FUZZ_shown_text_LIBS hf_posix)
