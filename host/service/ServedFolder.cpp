@@ -1,5 +1,6 @@
 #include "service/ServedFolder.h"
 
+#include <cups/cups.h>
 #include <sys/stat.h>
 #include <thread>
 
@@ -139,8 +140,13 @@ void ServedFolder::Print(const std::function<bool()>& stop)
     const posix::ActingAs acting(m_owner);
     if (!acting.Acting())
         return;
+    // The scheduler knows the jobs as the owner's (its user name in every
+    // request); for the rest of the process they stay its own.
+    const std::string previous = cupsUser();
+    cupsSetUser(m_owner.name.c_str());
     m_printing->Submit(stop);
     m_printing->Follow();
+    cupsSetUser(previous.c_str());
 }
 
 size_t ServedFolder::TakeBatch(size_t limit, const std::function<bool()>& stop)

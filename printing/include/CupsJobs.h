@@ -59,6 +59,7 @@ struct JobState
     std::string reasons;   // job-state-reasons, or the printer's message
     std::string marker;    // given at creation; empty when none
     std::string name;      // job-name
+    std::string user;      // job-originating-user-name: whose job it is
 };
 
 // The state of one job; found false when the scheduler no longer knows it.

@@ -130,6 +130,8 @@ std::vector<JobState> JobsOf(ipp_t* response)
             job.id = ippGetInteger(a, 0);
         else if (!std::strcmp(name, "job-name"))
             job.name = ippGetString(a, 0, nullptr) ? ippGetString(a, 0, nullptr) : "";
+        else if (!std::strcmp(name, "job-originating-user-name"))
+            job.user = ippGetString(a, 0, nullptr) ? ippGetString(a, 0, nullptr) : "";
         else if (!std::strcmp(name, "job-state"))
             job.end = EndOf(ippGetInteger(a, 0));
         else if (!std::strcmp(name, "job-state-reasons"))
@@ -158,6 +160,7 @@ std::vector<JobState> JobsOf(ipp_t* response)
 
 const char* const kJobAttributes[] = {"job-id",
                                       "job-name",
+                                      "job-originating-user-name",
                                       "job-state",
                                       "job-state-reasons",
                                       "job-printer-state-message",

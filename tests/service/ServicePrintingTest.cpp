@@ -4,6 +4,8 @@
 // and nothing is lost or printed twice; status tells the queue's state.
 #include "CupsJobs.h"
 #include "PrivateCupsd.h"
+#include <sys/stat.h>
+
 #include "ServiceTestSupport.h"
 
 using namespace service_test;
@@ -108,6 +110,34 @@ TEST_F(ServicePrinting, EveryDropIsOneCompletedJobNamedAfterItsOriginal)
     // The paper travels with the job to the queue's filter.
     EXPECT_NE(ReadFile(scratch + "/device.ps").find("*PageSize A4"), std::string::npos);
     EXPECT_EQ(Count(host->Err(), "<3>"), 0u) << host->Err();
+}
+
+TEST_F(ServicePrinting, AUsersFolderPrintsAsThatUser)
+{
+    if (geteuid() != 0)
+        GTEST_SKIP() << "needs root, as the service runs";
+    ASSERT_EQ(chmod(scratch.c_str(), 0755), 0);
+    const std::string folder = BoundFolder("user");
+    ASSERT_EQ(testkit::RunProgram({"chown", "-R", "65534:65534", folder}).exitCode, 0);
+    const std::string root = BoundFolder("admin");
+    auto host = Serve(2);
+    Drop(folder, "theirs.eps");
+    Drop(root, "ours.eps");
+    ASSERT_TRUE(WaitFor(
+        [&] {
+            return AllPrintedOnce({"theirs.eps", "ours.eps"});
+        },
+        20000))
+        << host->Err();
+    std::map<std::string, std::vector<printing::JobState>> marked;
+    printing::CupsError error;
+    ASSERT_TRUE(printing::ListMarkedJobs("office", marked, error)) << error.reason;
+    std::map<std::string, std::string> users;
+    for (const auto& entry : marked)
+        for (const printing::JobState& job : entry.second)
+            users[job.name] = job.user;
+    EXPECT_EQ(users["theirs.eps"], "nobody");
+    EXPECT_EQ(users["ours.eps"], "root");
 }
 
 TEST_F(ServicePrinting, AStoppedQueueAndACancelledJobShowAsTheSchedulerSaysThem)
