@@ -184,27 +184,29 @@ int RunStatusCommand(const Arguments& args)
     }
     PrintLine(wxString("Service:       ") + (running ? "running" : "not running") +
               (paused ? " (paused: StopHF present)" : ""));
+    // Paths, names and reasons are outside text: each line stays one line.
+    const auto ShowLine = [](const wxString& line) { PrintLine(posix::ShownLine(line)); };
     if (folders.empty())
-        PrintLine("No hot folders are listed.");
+        ShowLine("No hot folders are listed.");
     for (const FolderStatus& folder : folders)
     {
-        PrintLine("");
-        PrintLine("Folder:        " + folder.path);
+        ShowLine("");
+        ShowLine("Folder:        " + folder.path);
         if (!folder.problem.empty())
         {
-            PrintLine("  Problem:     " + folder.problem);
+            ShowLine("  Problem:     " + folder.problem);
             continue;
         }
-        PrintLine("  Server:      " + (folder.server.empty() ? wxString("(none)") : folder.server));
-        PrintLine("  Output:      " + folder.outputType +
-                  (folder.page.empty() ? wxString() : ", page " + folder.page));
-        PrintLine(wxString::Format("  Waiting:     %zu file(s)", folder.waiting));
-        PrintLine(wxString::Format("  Done:        %zu today, %zu in total", folder.doneToday,
-                                   folder.doneTotal));
-        PrintLine(wxString::Format("  Failed:      %zu today, %zu in total", folder.failedToday,
-                                   folder.failedTotal));
-        PrintLine("  Last failure: " +
-                  (folder.lastFailure.empty() ? wxString("(none)") : folder.lastFailure));
+        ShowLine("  Server:      " + (folder.server.empty() ? wxString("(none)") : folder.server));
+        ShowLine("  Output:      " + folder.outputType +
+                 (folder.page.empty() ? wxString() : ", page " + folder.page));
+        ShowLine(wxString::Format("  Waiting:     %zu file(s)", folder.waiting));
+        ShowLine(wxString::Format("  Done:        %zu today, %zu in total", folder.doneToday,
+                                  folder.doneTotal));
+        ShowLine(wxString::Format("  Failed:      %zu today, %zu in total", folder.failedToday,
+                                  folder.failedTotal));
+        ShowLine("  Last failure: " +
+                 (folder.lastFailure.empty() ? wxString("(none)") : folder.lastFailure));
         if (folder.queue.empty() && !folder.printing)
             continue;
         wxString queue = FromUtf8(folder.queue.empty() ? "(none)" : folder.queue);
@@ -212,15 +214,15 @@ int RunStatusCommand(const Arguments& args)
             queue += ", " + FromUtf8(folder.queueState);
         for (const std::string& reason : folder.queueReasons)
             queue += ", " + FromUtf8(reason);
-        PrintLine("  Printer:     " + queue);
+        ShowLine("  Printer:     " + queue);
         if (!folder.printingHeld.empty())
-            PrintLine("  Problem:     " + folder.printingHeld);
-        PrintLine(wxString::Format("  Printing:    %zu now, %zu printed today, %zu in total, %zu "
-                                   "printer failure(s) today",
-                                   folder.printing, folder.printedToday, folder.printedTotal,
-                                   folder.printFailedToday));
+            ShowLine("  Problem:     " + folder.printingHeld);
+        ShowLine(wxString::Format("  Printing:    %zu now, %zu printed today, %zu in total, %zu "
+                                  "printer failure(s) today",
+                                  folder.printing, folder.printedToday, folder.printedTotal,
+                                  folder.printFailedToday));
         if (!folder.lastPrintFailure.empty())
-            PrintLine("  Last printer failure: " + folder.lastPrintFailure);
+            ShowLine("  Last printer failure: " + folder.lastPrintFailure);
     }
     return kExitSuccess;
 }

@@ -69,6 +69,8 @@ TEST_F(HostNames, ShownInEveryLineReadBackAndNeverRun)
     for (const DroppedName& name : names)
         named = named || lastFailure.rfind(name.raw + ": cannot deliver", 0) == 0;
     EXPECT_TRUE(named) << status.out;
+    const std::string plain = Host({"status"}).out;
+    EXPECT_EQ(LinesWithControls(plain), std::vector<std::string>()) << plain;
 
     // Then converted: retried, every name becomes one output that prints
     // nothing when it runs.
