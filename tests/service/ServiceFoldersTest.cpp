@@ -297,6 +297,27 @@ TEST_F(ServiceTest, TheInstalledUnitVerifies)
     EXPECT_EQ(verify.err, "");
 }
 
+TEST_F(ServiceTest, TheInstalledUnitIsSandboxed)
+{
+    if (testkit::RunProgram({"systemd-analyze", "--version"}).exitCode != 0)
+        GTEST_SKIP() << "systemd-analyze is not installed; the sandbox is not rated";
+    const std::string prefix = scratch + "/installed";
+    ASSERT_EQ(testkit::RunProgram({HF_CMAKE_COMMAND, "--install", HF_BUILD_DIR, "--prefix", prefix})
+                  .exitCode,
+              0);
+    const std::string unit = prefix + "/lib/systemd/system/hotfolder.service";
+    const testkit::ProcessResult rating =
+        testkit::RunProgram({"systemd-analyze", "security", "--offline=yes", unit});
+    const std::string overall = "Overall exposure level for hotfolder.service: ";
+    const size_t at = rating.out.find(overall);
+    ASSERT_NE(at, std::string::npos) << rating.out << rating.err;
+    const double exposure = std::strtod(rating.out.c_str() + at + overall.size(), nullptr);
+    std::printf("systemd-analyze security: exposure %.1f of 10 (at most 3.0)\n", exposure);
+    RecordProperty("exposure", std::to_string(exposure));
+    EXPECT_GT(exposure, 0.0) << rating.out;
+    EXPECT_LE(exposure, 3.0) << rating.out;
+}
+
 TEST_F(ServiceTest, RunWalksTheServicesRoadOneProcessAFolder)
 {
     const std::string folder = MakePostScriptFolder("A4", "hot");
