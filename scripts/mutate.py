@@ -57,7 +57,7 @@ AREAS = OrderedDict([
     ("sdk", ["frame", "units"]),
     ("host", ["host", "service"]),
     ("printing", ["ppd", "host", "service"]),
-    ("posix", ["engine", "store", "machine", "host"]),
+    ("posix", ["engine", "store", "machine", "host", "service"]),
 ])
 
 # ---------------------------------------------------------------- tokens

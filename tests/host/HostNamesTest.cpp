@@ -110,3 +110,26 @@ TEST_F(HostNames, AMovedFolderTakesItsPlacesAlongAndNothingIsMadeWhereItWas)
     const testkit::ProcessResult second = Host({"run", moved});
     EXPECT_EQ(second.err.find("was moved"), std::string::npos) << second.err;
 }
+
+TEST_F(HostNames, RootWorksAUsersFolderAsItsOwner)
+{
+    if (geteuid() != 0)
+        GTEST_SKIP() << "needs root";
+    ASSERT_EQ(chmod(scratch.c_str(), 0755), 0);
+    const mode_t umaskBefore = umask(002); // a group-writable umask, as with user groups
+    const std::string folder = MakePostScriptFolder("A4", "theirs");
+    umask(umaskBefore);
+    struct stat container;
+    ASSERT_EQ(stat(Container(folder).c_str(), &container), 0);
+    EXPECT_EQ(container.st_mode & 022, 0u) << "init leaves the container writable by others";
+    ASSERT_EQ(testkit::RunProgram({"chown", "-R", "65534:65534", folder}).exitCode, 0);
+    ASSERT_EQ(testkit::RunProgram({"rm", "-rf", folder + "/Output"}).exitCode, 0);
+    CopyExample("label.eps", folder);
+    const testkit::ProcessResult run = Host({"run", folder});
+    EXPECT_EQ(run.exitCode, 0) << run.err;
+    for (const std::string& made : {folder + "/Output", folder + "/Output/label.ps"})
+    {
+        struct stat info;
+        EXPECT_TRUE(stat(made.c_str(), &info) == 0 && info.st_uid == 65534) << made;
+    }
+}
