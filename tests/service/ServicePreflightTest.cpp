@@ -50,3 +50,35 @@ TEST_F(ServiceTest, ThePreflightSwitchAppliesFromTheNextJob)
         }
     }
 }
+
+TEST_F(ServiceTest, GhostscriptRunsWithTheFolderOwnersRightsOnly)
+{
+    if (geteuid() != 0)
+        GTEST_SKIP() << "needs root, as the service runs";
+    if (!testkit::ProgramAvailable("gs"))
+        GTEST_SKIP() << "Ghostscript is not installed";
+    ASSERT_EQ(chmod(scratch.c_str(), 0755), 0);
+    const std::string folder = MakePostScriptFolder("A4", "user");
+    ASSERT_EQ(Host({"settings", folder, "--preflight", "on"}).exitCode, 0);
+    ASSERT_EQ(testkit::RunProgram({"chown", "-R", "65534:65534", folder}).exitCode, 0);
+    const std::string log = Failed(folder) + "/failed-jobs.log";
+    {
+        // Ghostscript itself reads what the owner's job made.
+        auto host = Serve(1);
+        WriteFile(folder + "/mine.eps", label);
+        EXPECT_TRUE(WaitFor([&] { return Exists(folder + "/Output/mine.ps"); }, 20000))
+            << host->Err() << ReadFile(log);
+        host->Signal(SIGTERM);
+        EXPECT_EQ(host->Wait(20000), 0);
+    }
+    setenv("HOTFOLDER_GHOSTSCRIPT", HF_IDENTITY_STAND_IN, 1);
+    auto host = Serve(1);
+    unsetenv("HOTFOLDER_GHOSTSCRIPT");
+    WriteFile(folder + "/who.eps", label);
+    EXPECT_TRUE(WaitFor([&] { return ReadFile(log).find("who.eps") != std::string::npos; }, 20000))
+        << host->Err();
+    EXPECT_NE(ReadFile(log).find("\twho.eps\tGhostscript ended with exit status 1: uid 65534 "
+                                 "65534 65534 gid 65534 65534 65534 groups 65534\n"),
+              std::string::npos)
+        << ReadFile(log);
+}
