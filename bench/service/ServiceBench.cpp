@@ -323,8 +323,8 @@ int BenchPreflight(const testkit::ScratchDir& scratch, const std::string& host,
         return 1;
     }
     const double off = Percentile(millis[0], 0.5), on = Percentile(millis[1], 0.5);
-    std::printf("preflight, drop to output, median over %d files each: off %.2f ms, on %.2f ms "
-                "(%.2f ms more per job)\n",
+    std::printf("preflight, drop to output, median over %d files each: off %.2f ms, on %.2f ms, "
+                "%.2f ms more per job (target: none, it is the price of a Ghostscript run)\n",
                 files, off, on, on - off);
     std::printf("ratio preflight_on_per_off %.3f\n", on / off);
     return 0;

@@ -143,6 +143,78 @@ void WaitBlocking(pid_t pid, int& status)
     {
     }
 }
+// Reads the child's streams until it has ended and they are closed, or
+// until the wall-clock limit kills what is left. False when it had to be
+// killed still running; status is its wait status once it has ended.
+bool Follow(pid_t pid, Stream (&streams)[3], int wallSeconds, int& status)
+{
+    UniqueFd exitSignal(static_cast<int>(syscall(SYS_pidfd_open, pid, 0)));
+    const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(wallSeconds);
+    bool exited = false;
+    for (;;)
+    {
+        if (!exited)
+        {
+            // ECHILD: SIGCHLD ignored reaps it unseen; its output still tells.
+            const pid_t waited = waitpid(pid, &status, WNOHANG);
+            exited = waited == pid || (waited < 0 && errno == ECHILD);
+        }
+        pollfd wanted[4];
+        nfds_t count = 0;
+        for (Stream& stream : streams)
+            if (stream.fd)
+                wanted[count++] = {stream.fd.Get(), POLLIN, 0};
+        if (exited && count == 0)
+            return true;
+        const auto left = std::chrono::duration_cast<std::chrono::milliseconds>(
+                              deadline - std::chrono::steady_clock::now())
+                              .count();
+        int timeout = static_cast<int>(std::max<long long>(left, 0));
+        if (!exited && exitSignal)
+            wanted[count++] = {exitSignal.Get(), POLLIN, 0};
+        else if (!exited && count == 0)
+            timeout = std::min(timeout, 10); // no process descriptor: look again soon
+        if (left <= 0 || (poll(wanted, count, timeout) < 0 && errno != EINTR))
+        {
+            // Whatever still runs in the group goes; a child that ended but
+            // left its streams to another process keeps its own end.
+            kill(-pid, SIGKILL);
+            if (!exited)
+            {
+                kill(pid, SIGKILL);
+                WaitBlocking(pid, status);
+            }
+            return exited;
+        }
+        for (Stream& stream : streams)
+            for (nfds_t i = 0; i < count; ++i)
+                if (stream.fd && wanted[i].fd == stream.fd.Get() && wanted[i].revents)
+                    ReadSome(stream);
+    }
+}
+
+void Conclude(const std::string& report, bool ended, int status, ChildRun& run)
+{
+    StartFailure failure = {};
+    if (report.size() == sizeof failure)
+    {
+        std::copy(report.begin(), report.end(), reinterpret_cast<char*>(&failure));
+        run.end = failure.identity ? ChildRun::End::IdentityRefused : ChildRun::End::NotStarted;
+        run.code = failure.error;
+    }
+    else if (!ended)
+        run.end = ChildRun::End::TimedOut;
+    else if (WIFEXITED(status))
+    {
+        run.end = ChildRun::End::Exited;
+        run.code = WEXITSTATUS(status);
+    }
+    else
+    {
+        run.end = ChildRun::End::Signalled;
+        run.code = WIFSIGNALED(status) ? WTERMSIG(status) : 0;
+    }
+}
 } // namespace
 
 ChildRun RunLimitedChild(const std::string& program, const std::vector<std::string>& args,
@@ -182,77 +254,13 @@ ChildRun RunLimitedChild(const std::string& program, const std::vector<std::stri
     outWrite.Reset();
     errWrite.Reset();
     reportWrite.Reset();
-    UniqueFd exitSignal(static_cast<int>(syscall(SYS_pidfd_open, pid, 0)));
-
     std::string report;
     Stream streams[] = {{std::move(outRead), &run.out, limits.outputBytes},
                         {std::move(errRead), &run.err, limits.outputBytes},
                         {std::move(reportRead), &report, sizeof(StartFailure)}};
-    const auto deadline =
-        std::chrono::steady_clock::now() + std::chrono::seconds(limits.wallSeconds);
-    bool exited = false, timedOut = false;
     int status = 0;
-    for (;;)
-    {
-        exited = exited || waitpid(pid, &status, WNOHANG) == pid;
-        pollfd wanted[4];
-        nfds_t count = 0;
-        for (Stream& stream : streams)
-            if (stream.fd)
-                wanted[count++] = {stream.fd.Get(), POLLIN, 0};
-        if (exited && count == 0)
-            break;
-        const auto left = std::chrono::duration_cast<std::chrono::milliseconds>(
-                              deadline - std::chrono::steady_clock::now())
-                              .count();
-        if (left <= 0)
-        {
-            // Whatever still runs in the group goes; a child that ended but
-            // left its streams to another process keeps its own end.
-            timedOut = !exited;
-            kill(-pid, SIGKILL);
-            if (!exited)
-                kill(pid, SIGKILL);
-            break;
-        }
-        int timeout = static_cast<int>(left);
-        if (!exited && exitSignal)
-            wanted[count++] = {exitSignal.Get(), POLLIN, 0};
-        else if (!exited && count == 0)
-            timeout = std::min(timeout, 10); // no process descriptor: look again soon
-        if (poll(wanted, count, timeout) < 0 && errno != EINTR)
-        {
-            kill(-pid, SIGKILL); // cannot watch it any more: it must not run on unseen
-            kill(pid, SIGKILL);
-            break;
-        }
-        for (Stream& stream : streams)
-            for (nfds_t i = 0; i < count; ++i)
-                if (stream.fd && wanted[i].fd == stream.fd.Get() && wanted[i].revents)
-                    ReadSome(stream);
-    }
-    if (!exited)
-        WaitBlocking(pid, status);
-
-    StartFailure failure = {};
-    if (report.size() == sizeof failure)
-    {
-        std::copy(report.begin(), report.end(), reinterpret_cast<char*>(&failure));
-        run.end = failure.identity ? ChildRun::End::IdentityRefused : ChildRun::End::NotStarted;
-        run.code = failure.error;
-    }
-    else if (timedOut)
-        run.end = ChildRun::End::TimedOut;
-    else if (WIFEXITED(status))
-    {
-        run.end = ChildRun::End::Exited;
-        run.code = WEXITSTATUS(status);
-    }
-    else
-    {
-        run.end = ChildRun::End::Signalled;
-        run.code = WIFSIGNALED(status) ? WTERMSIG(status) : 0;
-    }
+    const bool ended = Follow(pid, streams, limits.wallSeconds, status);
+    Conclude(report, ended, status, run);
     return run;
 }
 } // namespace posix
