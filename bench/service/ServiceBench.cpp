@@ -1,5 +1,5 @@
-// bench_service [latency-files] [burst-files-per-folder]
-// (defaults 1000 and 1000): hotfolder serve on scratch folders.
+// bench_service [latency-files] [burst-files-per-folder] [preflight-files]
+// (defaults 1000, 1000 and 20): hotfolder serve on scratch folders.
 //  1. Latency: files dropped one at a time into one folder, written in place
 //     (open, write, close, as cp does) and renamed in; the time from the
 //     drop to the output's appearance (its rename into the output folder),
@@ -11,6 +11,9 @@
 //     its own. Latency from the drop to the job created at the scheduler
 //     with its document sent (the service's "queued" line), p50 and p99;
 //     then a burst, in jobs per second from the drop to "completed".
+//  5. Preflight: two folders of one service, one with the preflight on;
+//     files dropped one at a time into each in turn, the median time from
+//     the drop to the output's appearance of each, side by side.
 #include <poll.h>
 #include <signal.h>
 #include <sys/inotify.h>
@@ -88,11 +91,14 @@ double Percentile(std::vector<double> values, double fraction)
 
 int BenchPrinting(const testkit::ScratchDir& scratch, const std::string& host,
                   const std::string& eps, int latencyFiles, int burstFiles);
+int BenchPreflight(const testkit::ScratchDir& scratch, const std::string& host,
+                   const std::string& eps, int files);
 
 int main(int argc, char** argv)
 {
     const int latencyFiles = argc > 1 ? std::atoi(argv[1]) : 1000;
     const int burstFiles = argc > 2 ? std::atoi(argv[2]) : 1000;
+    const int preflightFiles = argc > 3 ? std::atoi(argv[3]) : 20;
     const int kBurstFolders = 8;
     const testkit::ScratchDir scratch("hf-bench-service");
     if (scratch.Path().empty())
@@ -249,7 +255,79 @@ int main(int argc, char** argv)
         std::printf("ratio outside_process %.3f (target < 0.333)\n",
                     std::atof(stats.c_str() + share + 14));
     std::printf("burst jobs per second (first burst): %.1f\n", firstBurstJobsPerSecond);
+    if (BenchPreflight(scratch, host, eps, preflightFiles) != 0)
+        return 1;
     return BenchPrinting(scratch, host, eps, latencyFiles / 5 + 1, burstFiles / 2 + 1);
+}
+
+// 5. The preflight's cost per job: a folder with it on beside one without,
+// in a warehouse of their own, so that the service serves these two only.
+int BenchPreflight(const testkit::ScratchDir& scratch, const std::string& host,
+                   const std::string& eps, int files)
+{
+    if (!testkit::ProgramAvailable("gs"))
+    {
+        std::printf("preflight: skipped (Ghostscript is not installed)\n");
+        return 0;
+    }
+    const std::string warehouse = std::getenv("HOTFOLDER_WAREHOUSE_ROOT");
+    setenv("HOTFOLDER_WAREHOUSE_ROOT", scratch.File("machine-preflight").c_str(), 1);
+    const std::string folders[] = {scratch.File("unchecked"), scratch.File("checked")};
+    for (const std::string& folder : folders)
+    {
+        testkit::RunProgram({host, "init", folder, "--server", HF_EXAMPLE_SERVER});
+        testkit::RunProgram({host, "settings", folder, "--set", "OUTPUTFILETYPEEPS=0",
+                             "OUTPUTFILETYPEPS=1", "DEFAULTPAGESIZE=A4"});
+    }
+    testkit::RunProgram({host, "settings", folders[1], "--preflight", "on"});
+    const std::string log = scratch.File("preflight-err.txt");
+    Service service;
+    service.pid = testkit::StartProgram({host, "serve"}, "", log);
+    const bool serving = testkit::WaitFor(
+        [&]
+        {
+            const std::string text = testkit::ReadFile(log);
+            return text.find("serving " + folders[0]) != std::string::npos &&
+                   text.find("serving " + folders[1]) != std::string::npos;
+        },
+        10000);
+    int inotify = inotify_init1(IN_CLOEXEC);
+    for (const std::string& folder : folders) // made by the service
+        inotify_add_watch(inotify, (folder + "/Output").c_str(), IN_MOVED_TO);
+    std::vector<double> millis[2];
+    for (int i = 0; serving && i < files; ++i)
+        for (int f = 0; f < 2; ++f) // in turns, so that load weighs on both alike
+        {
+            const std::string name = "p" + std::to_string(i);
+            testkit::WriteFile(scratch.File("staging.eps"), eps);
+            rename(scratch.File("staging.eps").c_str(), (folders[f] + "/" + name + ".eps").c_str());
+            const auto dropped = Clock::now();
+            if (!AwaitOutput(inotify, name + ".ps", 120000))
+            {
+                std::fprintf(stderr, "bench_service: no output for %s in %s\n%s", name.c_str(),
+                             folders[f].c_str(), testkit::ReadFile(log).c_str());
+                close(inotify);
+                return 1;
+            }
+            millis[f].push_back(
+                std::chrono::duration<double, std::milli>(Clock::now() - dropped).count());
+        }
+    close(inotify);
+    testkit::RunProgram({host, "stop"});
+    testkit::WaitProgram(service.pid);
+    service.pid = -1;
+    setenv("HOTFOLDER_WAREHOUSE_ROOT", warehouse.c_str(), 1);
+    if (!serving)
+    {
+        std::fprintf(stderr, "bench_service: the preflight service did not start\n");
+        return 1;
+    }
+    const double off = Percentile(millis[0], 0.5), on = Percentile(millis[1], 0.5);
+    std::printf("preflight, drop to output, median over %d files each: off %.2f ms, on %.2f ms, "
+                "%.2f ms more per job (target: none, it is the price of a Ghostscript run)\n",
+                files, off, on, on - off);
+    std::printf("ratio preflight_on_per_off %.3f\n", on / off);
+    return 0;
 }
 
 // 4. Printing through a private scheduler.

@@ -24,7 +24,8 @@
 
 static const char kSettingsUsage[] =
     "usage: hotfolder settings FOLDER [--show | --set KEY=VALUE ... | --accept]\n"
-    "                          [--printer QUEUE|none] [--module PATH]\n"
+    "                          [--printer QUEUE|none] [--preflight on|off]\n"
+    "                          [--module PATH]\n"
     "\n"
     "Without options, opens the filter's settings panel in a window; OK stores\n"
     "the settings in the folder's Folder.cfg, Cancel leaves them alone.\n"
@@ -38,6 +39,10 @@ static const char kSettingsUsage[] =
     "  --printer  bind the folder to the CUPS queue QUEUE: its papers become the\n"
     "             folder's server description and the service prints every\n"
     "             output there; 'none' prints nowhere, outputs stay in Output\n"
+    "  --preflight on|off\n"
+    "             on: every output goes through Ghostscript before delivery; an\n"
+    "             output it cannot run to the end, or with a page without marks,\n"
+    "             fails its job. off: outputs are delivered as made\n"
     "\n"
     "Keys: OUTPUTFILETYPEEPS OUTPUTFILETYPEPS DEFAULTPAGESIZE CUSTOMPAGESIZE\n"
     "      IMAGEPOSITION (Top Left, Top Right, Center, Bottom Left, Bottom Right)\n"
@@ -97,6 +102,23 @@ int SetSettings(HotFolder& folder, const wxString& identifier, const ServerDescr
     }
     PrintLine("Settings of " + folder.GetFolder() + " updated.");
     return kExitSuccess;
+}
+
+// The "Status" entry of the folder's PreflightSettings; the other entries stay.
+bool SavePreflightSwitch(HotFolder& folder, bool on)
+{
+    db::PreflightConfiguration preflight = folder.GetPreflight();
+    preflight.SetPreflightEnabled(on);
+    wxString error;
+    if (!folder.SavePreflight(preflight, error))
+    {
+        PrintError(error);
+        return false;
+    }
+    PrintLine(folder.GetFolder() + (on ? ": preflight on; every output goes through Ghostscript "
+                                         "before it is delivered"
+                                       : ": preflight off"));
+    return true;
 }
 
 class HostApp : public wxApp
@@ -182,10 +204,18 @@ int RunSettingsCommand(int argc, char** argv, const Arguments& args)
                           {{"--show", false, false, ""},
                            {"--set", false, true, ""},
                            {"--accept", false, false, ""},
-                           {"--printer", true, false, ""}},
+                           {"--printer", true, false, ""},
+                           {"--preflight", true, false, ""}},
                           kSettingsUsage, 1, 1, parsed, status))
         return status;
-    const bool windowed = !parsed.Has("--show") && !parsed.Has("--set") && !parsed.Has("--printer");
+    const std::string preflight = parsed.Get("--preflight");
+    if (parsed.Has("--preflight") && preflight != "on" && preflight != "off")
+    {
+        PrintError("--preflight takes on or off");
+        return kExitUsage;
+    }
+    const bool windowed = !parsed.Has("--show") && !parsed.Has("--set") &&
+                          !parsed.Has("--printer") && !parsed.Has("--preflight");
     std::unique_ptr<wxInitializer> initializer;
     if (!windowed)
     {
@@ -233,10 +263,17 @@ int RunSettingsCommand(int argc, char** argv, const Arguments& args)
         PrintLine(queue == "none" ? folder.GetFolder() + " prints nowhere; outputs stay in " +
                                         folder.GetDefaultOutputFolder()
                                   : folder.GetFolder() + " prints on " + FromUtf8(queue));
-        if (!parsed.Has("--set") && !parsed.Has("--show"))
+        if (!parsed.Has("--set") && !parsed.Has("--show") && !parsed.Has("--preflight"))
             return kExitSuccess;
         if (!OpenFolderAndServer(parsed.positionals[0], folder, server))
             return kExitSetupFailed;
+    }
+    if (parsed.Has("--preflight"))
+    {
+        if (!SavePreflightSwitch(folder, preflight == "on"))
+            return kExitSetupFailed;
+        if (!parsed.Has("--set") && !parsed.Has("--show"))
+            return kExitSuccess;
     }
     const wxString modulePath = LocateFilterModule(FromUtf8(parsed.Get("--module")));
     if (windowed)

@@ -130,14 +130,26 @@ bool HotFolder::SaveFilter(const wxXmlNode& filter, wxString& error)
 
     db::FilterConfiguration filters;
     filters.SetFilterSettingNode(filterSetting);
+    return Save(filters, m_preflight, error);
+}
+
+bool HotFolder::SavePreflight(const db::PreflightConfiguration& preflight, wxString& error)
+{
+    return Save(m_filters, preflight, error);
+}
+
+bool HotFolder::Save(const db::FilterConfiguration& filters,
+                     const db::PreflightConfiguration& preflight, wxString& error)
+{
     wxString saved;
     if (db::HFDatabase::WriteFolderProperties(m_configFile, m_setting, m_jobs, m_folders, filters,
-                                              m_impose, m_preflight, saved) != 0)
+                                              m_impose, preflight, saved) != 0)
     {
         error = wxString::Format("cannot write the folder configuration %s", m_configFile);
         return false;
     }
     m_filters = filters;
+    m_preflight = preflight;
     return true;
 }
 

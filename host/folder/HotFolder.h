@@ -60,7 +60,15 @@ public:
     // reason when the configuration cannot be written.
     bool FollowMove(wxString& note, wxString& error);
 
+    // The stored "PreflightSettings" entries.
+    const db::PreflightConfiguration& GetPreflight() const { return m_preflight; }
+    // Rewrites Folder.cfg with these entries; everything else as read.
+    bool SavePreflight(const db::PreflightConfiguration& preflight, wxString& error);
+
 private:
+    bool Save(const db::FilterConfiguration& filters, const db::PreflightConfiguration& preflight,
+              wxString& error);
+
     wxString m_folder;
     wxString m_configFile;
     db::Setting m_setting;

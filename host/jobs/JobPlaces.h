@@ -12,6 +12,8 @@ struct JobPlaces
     wxString keptFolder;   // originals of successful jobs
     wxString outputFolder; // outputs and their job tickets
     std::string cupsQueue; // where delivered outputs are printed; empty: nowhere
+    // Every output goes through Ghostscript before delivery (Preflight.h).
+    bool preflight = false;
 };
 
 // The failure log in the failed folder: "time <TAB> name <TAB> reason" lines.

@@ -193,6 +193,7 @@ FolderStatus ReadFolderStatus(const wxString& path)
     }
     status.outputType = passThrough == "1" ? "EPS (passed through)" : "PostScript";
     status.page = custom == "1" ? wxString("custom") : page;
+    status.preflight = folder.GetPreflight().IsPreflightEnabled();
     status.waiting = ListFolderFiles(folder.GetFolder()).size();
     CountKept(folder.GetKeptOriginalsFolder(), status);
     CountFailed(folder.GetFailedFolder(), status);

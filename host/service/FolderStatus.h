@@ -17,6 +17,7 @@ struct FolderStatus
     wxString server;  // the bound server's name; empty when none
     wxString outputType;
     wxString page;
+    bool preflight = false; // outputs go through Ghostscript before delivery
     size_t waiting = 0;
     size_t doneToday = 0, doneTotal = 0;
     size_t failedToday = 0, failedTotal = 0;

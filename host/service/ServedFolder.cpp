@@ -58,6 +58,7 @@ std::unique_ptr<ServedFolder> ServedFolder::Open(const wxString& path, const Fol
     places.outputFolder =
         options.outputFolder.empty() ? folder.GetDefaultOutputFolder() : options.outputFolder;
     places.cupsQueue = options.queue.empty() ? folder.GetBoundQueue() : options.queue;
+    places.preflight = folder.GetPreflight().IsPreflightEnabled();
     for (const wxString& directory :
          {places.outputFolder, places.workFolder, places.failedFolder, places.keptFolder})
         if (!EnsureWritableDirectory(directory, error))

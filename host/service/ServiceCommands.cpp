@@ -43,11 +43,12 @@ static const char kStatusUsage[] =
     "usage: hotfolder status [--json]\n"
     "\n"
     "Tells whether the hot-folder service runs and, for every listed folder, its\n"
-    "server, output type and page, the files waiting, the jobs done and failed\n"
-    "(today and in total) and the last failure; for a folder that prints, its\n"
-    "queue with the state and reasons the scheduler reports, the jobs printing\n"
-    "now, printed (today and in total), the printer failures today and the last\n"
-    "one. --json prints one JSON object.\n";
+    "server, output type and page, whether its preflight is on, the files\n"
+    "waiting, the jobs done and failed (today and in total) and the last\n"
+    "failure; for a folder that prints, its queue with the state and reasons\n"
+    "the scheduler reports, the jobs printing now, printed (today and in\n"
+    "total), the printer failures today and the last one. --json prints one\n"
+    "JSON object.\n";
 
 static const char kRemoveUsage[] =
     "usage: hotfolder remove FOLDER\n"
@@ -177,7 +178,8 @@ int RunStatusCommand(const Arguments& args)
                                      "\"printed_total\": %zu, \"print_failed_today\": %zu",
                                      folder.printing, folder.printedToday, folder.printedTotal,
                                      folder.printFailedToday)
-                 << ", \"last_print_failure\": " << JsonTextOrNull(folder.lastPrintFailure) << "}";
+                 << ", \"last_print_failure\": " << JsonTextOrNull(folder.lastPrintFailure)
+                 << ", \"preflight\": " << (folder.preflight ? "true" : "false") << "}";
         }
         PrintLine(json + "]}");
         return kExitSuccess;
@@ -200,6 +202,8 @@ int RunStatusCommand(const Arguments& args)
         ShowLine("  Server:      " + (folder.server.empty() ? wxString("(none)") : folder.server));
         ShowLine("  Output:      " + folder.outputType +
                  (folder.page.empty() ? wxString() : ", page " + folder.page));
+        if (folder.preflight)
+            ShowLine("  Preflight:   on (Ghostscript checks every output)");
         ShowLine(wxString::Format("  Waiting:     %zu file(s)", folder.waiting));
         ShowLine(wxString::Format("  Done:        %zu today, %zu in total", folder.doneToday,
                                   folder.doneTotal));

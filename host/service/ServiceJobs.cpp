@@ -17,6 +17,7 @@
 #include "posix/NativePath.h"
 #include "folder/FileMoves.h"
 #include "jobs/JobExecution.h"
+#include "jobs/Preflight.h"
 #include "jobs/RunStatistics.h"
 #include "module/FilterSession.h"
 #include "service/FolderJournal.h"
@@ -283,6 +284,12 @@ JobOutcome ServiceJobs::Continue(const wxString& id, ReadyToProcessJobInfo job)
         return Fail(id, job.jobName,
                     output.status != 0 ? m_session.DescribeStatus(output.status)
                                        : wxString("the filter reported no output file"));
+    }
+    if (m_places.preflight)
+    {
+        const std::string problem = PreflightProblem(Native(output.producedPath));
+        if (!problem.empty())
+            return Fail(id, job.jobName, wxString::FromUTF8(problem));
     }
 
     if (!Stage(workConfig, StagedPath(id, "ticket"), false, error) ||

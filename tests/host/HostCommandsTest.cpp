@@ -15,6 +15,10 @@ TEST_F(HostScript, Runs)
 {
     Run("run.txt");
 }
+TEST_F(HostScript, Preflight)
+{
+    Run("preflight.txt");
+}
 
 TEST_F(HostScript, SettingsWindow)
 {

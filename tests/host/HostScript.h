@@ -24,7 +24,7 @@
 // blanks. In every field: $S scratch, $H $S/hot, $C its container, $K its
 // kept originals, $F its failed files, $W the warehouse, $EX examples/eps,
 // $SERVER the example server, $DATA tests/data, $BAD a module without an
-// entry point, $CUPS the scheduler's address, \n a new line.
+// entry point, $CUPS the scheduler's address, \n a new line, \t a tab.
 #include <memory>
 
 #include "GhostscriptOracle.h"
@@ -197,7 +197,8 @@ private:
                                                              {"$F", container + "/[FailedFolder]"},
                                                              {"$W", root + "/machine/HotFolders"},
                                                              {"$S", root},
-                                                             {"\\n", "\n"}};
+                                                             {"\\n", "\n"},
+                                                             {"\\t", "\t"}};
         for (const auto& [name, value] : names)
             for (size_t at = text.find(name); at != std::string::npos;
                  at = text.find(name, at + value.size()))

@@ -52,6 +52,41 @@ TEST(PreflightModel, FirstStatusEntryDecidesWithoutRegardToCase)
     EXPECT_FALSE(db::Setting::PairString("EPS", "a") == db::Setting::PairString("EPS", "b"));
 }
 
+namespace
+{
+db::PreflightConfiguration::List PreflightEntries(const std::string& text)
+{
+    db::PreflightConfiguration::List entries;
+    if (text != "-")
+        for (const std::string& entry : testkit::Split(text, "; "))
+            entries.emplace_back(entry.substr(0, entry.find('=')),
+                                 entry.substr(entry.find('=') + 1));
+    return entries;
+}
+
+std::string Shown(const db::PreflightConfiguration::List& entries)
+{
+    std::string text;
+    for (const auto& entry : entries)
+        text += (text.empty() ? "" : "; ") + entry.GetKey().ToStdString() + "=" +
+                entry.GetValue().ToStdString();
+    return text.empty() ? "-" : text;
+}
+} // namespace
+
+TEST(PreflightModel, TheSwitchSetsTheDecidingEntryAndKeepsTheOthers)
+{
+    for (const testkit::CaseFields& c : testkit::Cases("store/preflight-switch.txt", 4, 4))
+    {
+        SCOPED_TRACE(c[0] + " | " + c[3]);
+        db::PreflightConfiguration preflight;
+        preflight.SetProperties(PreflightEntries(c[0]));
+        preflight.SetPreflightEnabled(c[1] == "on");
+        EXPECT_EQ(Shown(preflight.GetProperties()), c[2]);
+        EXPECT_EQ(preflight.IsPreflightEnabled(), c[1] == "on");
+    }
+}
+
 TEST(FilterOutputFormat, DecidedByTheFilterOwnSettings)
 {
     db::FilterConfiguration filter;

@@ -36,6 +36,9 @@ public:
 
     // True when the first entry keyed "Status" (any case) holds "true" (any case).
     bool IsPreflightEnabled() const;
+    // Sets that entry to "true" or "false", keeping its key as spelt and
+    // every other entry; adds a "Status" entry at the end when there is none.
+    void SetPreflightEnabled(bool enabled);
 
 private:
     List m_Properties;
