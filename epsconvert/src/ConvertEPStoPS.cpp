@@ -1,15 +1,24 @@
 // Wraps the EPS program of a recognised file in a one-page PostScript job.
+#include <cerrno>
 #include <cstdio>
 #include <string>
 
 #include "EPStoPS.h"
 #include "EngineMessages.h"
+#include "FailureRecord.h"
+#include "posix/ErrorText.h"
 #include "LocaleDecimalPoint.h"
 #include "PageLayout.h"
 #include "PostScriptWrapper.h"
 
 namespace
 {
+void RecordWriteFailure(const char* outputPath, int error)
+{
+    RecordFailure(EPS_FAILURE_RESOURCES, "cannot write " + ShownFileName(outputPath) +
+                                             (error ? ": " + posix::ErrorText(error) : ""));
+}
+
 void ReplaceAll(std::string& text, const std::string& from, const std::string& to)
 {
     if (from.empty())
@@ -45,14 +54,23 @@ bool WriteHeader(FILE* out, std::string header, const std::string& decimalPoint)
 
 int ConvertEPStoPS(void** context, const EPStoPSparams_t* params, const char* outputPath)
 {
+    ClearFailure();
     const std::string decimalPoint = CurrentLocaleDecimalPoint();
     if (!context || !*context)
+    {
+        RecordFailure(EPS_FAILURE_RESOURCES, "no file description was given");
         return 0;
+    }
     auto* info = static_cast<EPSinfo_t*>(*context);
 
+    errno = 0;
     FILE* out = (params && outputPath) ? fopen(outputPath, "wb") : nullptr;
     if (!out)
     {
+        if (params && outputPath)
+            RecordWriteFailure(outputPath, errno);
+        else
+            RecordFailure(EPS_FAILURE_RESOURCES, "no output was given");
         EPStoPSfreeMemory(context);
         return 0;
     }
@@ -61,20 +79,29 @@ int ConvertEPStoPS(void** context, const EPStoPSparams_t* params, const char* ou
     const std::string header = FormatWrapperHeader(info->docName, CurrentCreationDate().c_str(),
                                                    layout, params->setPageDeviceString);
     int result = 0;
+    errno = 0;
     if (WriteHeader(out, header, decimalPoint))
     {
         ExtractEPSfromTIFFpreview(info->epsFile, out, static_cast<long>(info->psOffset),
                                   static_cast<long>(info->psLength));
         const char* trailer = WrapperTrailer();
         if (fputs(trailer, out) < 0)
+        {
+            RecordWriteFailure(outputPath, errno);
             WriteEngineMessage("Error from fwrite in ConvertEPStoPS\n");
+        }
         else
             result = 1;
     }
+    else
+        RecordWriteFailure(outputPath, errno);
 
     EPStoPSfreeMemory(context);
     // Buffered bytes reach the file only here; a failure now is a failed job.
-    if (fclose(out) != 0)
+    if (fclose(out) != 0 && result)
+    {
+        RecordWriteFailure(outputPath, errno);
         result = 0;
+    }
     return result;
 }

@@ -14,13 +14,16 @@
 #include "EPStoPS.h"
 #include "EngineAlloc.h"
 #include "EngineMessages.h"
+#include "FailureRecord.h"
 #include "LineReader.h"
+#include "posix/OutsideText.h"
 
 namespace
 {
 constexpr unsigned char kDosEpsMagic[4] = {0xC5, 0xD0, 0xD3, 0xC6};
 constexpr int kMaxHeaderLines = 1000;
 constexpr size_t kFirstLineBytes = 255;
+constexpr char kSignatureWanted[] = "%!PS-Adobe-x.x EPSF-x.x";
 
 uint32_t LittleEndian32(const unsigned char* bytes)
 {
@@ -88,10 +91,9 @@ bool ReadNumber(const char*& next, double& value)
 
 // Parses the four numbers after a bounding-box keyword of keywordLength
 // characters; false when there are fewer. Only the first 255 characters of
-// the line count.
-bool ParseBox(const char* line, size_t keywordLength, double box[4])
+// the line count; they are kept in copy.
+bool ParseBox(const char* line, size_t keywordLength, double box[4], char (&copy)[256])
 {
-    char copy[256];
     const size_t length = std::min(std::strlen(line), sizeof copy - 1);
     std::memcpy(copy, line, length);
     copy[length] = '\0';
@@ -155,19 +157,50 @@ struct Head
     size_t got;      // fewer than capacity only when the file ended
 };
 
+void RecordNotEps(const std::string& why)
+{
+    RecordFailure(EPS_FAILURE_NOT_EPS, "not an EPS file: " + why);
+}
+
+// Why a DOS EPS binary's section start shows no signature: a start outside
+// the file or inside its header is damage, anything else is no EPS.
+void RecordNoDosSignature(const EPSinfo_t* info)
+{
+    struct stat status;
+    const bool sized = fstat(fileno(info->epsFile), &status) == 0 && S_ISREG(status.st_mode);
+    const std::string start = "the file is damaged: its PostScript section should start at byte " +
+                              std::to_string(info->psOffset);
+    if (sized && info->psOffset >= status.st_size)
+        RecordFailure(EPS_FAILURE_DAMAGED, start + ", but the file ends after " +
+                                               std::to_string(status.st_size) + " bytes");
+    else if (info->psOffset < kDosEpsHeaderBytes)
+        RecordFailure(EPS_FAILURE_DAMAGED, start + ", inside the " +
+                                               std::to_string(kDosEpsHeaderBytes) +
+                                               "-byte DOS EPS header");
+    else
+        RecordNotEps(std::string("the first line of its PostScript section is not ") +
+                     kSignatureWanted);
+}
+
 // Finds the PostScript program and checks its signature; false rejects.
-bool LocateProgram(EPSinfo_t* info, const Head& head)
+bool LocateProgram(EPSinfo_t* info, const Head& head, const char* path)
 {
     const auto* header = reinterpret_cast<const unsigned char*>(head.bytes);
     if (head.got < 12)
+    {
+        RecordNotEps(head.got == 0 ? "it is empty" : "it is shorter than 12 bytes");
         return false;
+    }
 
-    if (std::memcmp(header, kDosEpsMagic, sizeof kDosEpsMagic) == 0)
+    const bool dosBinary = std::memcmp(header, kDosEpsMagic, sizeof kDosEpsMagic) == 0;
+    if (dosBinary)
     {
         info->psOffset = LittleEndian32(header + 4);
         info->psLength = LittleEndian32(header + 8);
         if (info->psOffset == 0 || info->psLength == 0)
         {
+            RecordNotEps(std::string("its DOS EPS header gives the PostScript section ") +
+                         (info->psOffset == 0 ? "offset 0" : "length 0"));
             info->psOffset = 0;
             info->psLength = 0;
             return false;
@@ -177,6 +210,7 @@ bool LocateProgram(EPSinfo_t* info, const Head& head)
         info->psLength = static_cast<int64_t>(head.got); // the whole file is in the head
     else if (!FileLength(info->epsFile, &info->psLength))
     {
+        RecordReadFailure(path, errno);
         info->psLength = 0;
         return false;
     }
@@ -193,11 +227,30 @@ bool LocateProgram(EPSinfo_t* info, const Head& head)
     }
     else if (!ReadAt(info->epsFile, info->psOffset, firstLine, kFirstLineBytes, &got))
     {
+        const int error = errno;
         WriteEngineMessage("Error from fread in IsThisEPS\n");
+        RecordReadFailure(path, error);
         return false;
     }
     firstLine[got] = '\0';
-    return IsEpsSignature(firstLine);
+    if (IsEpsSignature(firstLine))
+        return true;
+    if (dosBinary)
+        RecordNoDosSignature(info);
+    else
+        RecordNotEps(std::string("its first line is not ") + kSignatureWanted);
+    return false;
+}
+
+// Reads one bounding-box line into the context; false, with the reason,
+// when it does not hold four numbers.
+bool TakeBox(EPSinfo_t* info, const char* line, size_t keywordLength)
+{
+    if (ParseBox(line, keywordLength, info->boundingBox, info->boxLine))
+        return true;
+    RecordNotEps("its bounding box \"" + posix::ShownText(info->boxLine) +
+                 "\" does not hold four numbers");
+    return false;
 }
 
 // Scans the header comments for the bounding box; false rejects.
@@ -224,12 +277,12 @@ bool ScanHeader(EPSinfo_t* info, Head& head)
             continue;
         if (std::strncmp(line, "%%BoundingBox:", 14) == 0)
         {
-            if (!ParseBox(line, 14, info->boundingBox))
+            if (!TakeBox(info, line, 14))
                 return false;
         }
         else if (std::strncmp(line, "%%HiResBoundingBox:", 19) == 0)
         {
-            if (!ParseBox(line, 19, info->boundingBox))
+            if (!TakeBox(info, line, 19))
                 return false;
             break;
         }
@@ -238,17 +291,41 @@ bool ScanHeader(EPSinfo_t* info, Head& head)
     }
     return true;
 }
+
+void RecordNoMemory(const char* path)
+{
+    RecordFailure(EPS_FAILURE_RESOURCES, "not enough memory to read " + ShownFileName(path));
+}
+
+// Reads the head of the open file; false, with the reason, when it cannot.
+bool ReadHead(EPSinfo_t* info, Head& head, const char* path)
+{
+    if (ReadAt(info->epsFile, 0, head.bytes, head.capacity, &head.got))
+        return true;
+    const int error = errno;
+    WriteEngineMessage("Error from fread of header in IsThisEPS\n");
+    if (error == EISDIR)
+        RecordNotEps("it is a folder");
+    else
+        RecordReadFailure(path, error);
+    return false;
+}
 } // namespace
 
 unsigned int IsThisEPS(const char* path, void** context)
 {
+    ClearFailure();
     if (!context)
+    {
+        RecordFailure(EPS_FAILURE_RESOURCES, "no place was given for the file's description");
         return 0;
+    }
     auto* info = static_cast<EPSinfo_t*>(EngineAlloc(sizeof(EPSinfo_t)));
     *context = info;
     if (!info)
     {
         WriteEngineMessage("Error from malloc in IsThisEPS\n");
+        RecordNoMemory(path);
         return 0;
     }
     std::memset(info, 0, sizeof *info);
@@ -257,6 +334,7 @@ unsigned int IsThisEPS(const char* path, void** context)
     char* buffer = AllocateWorkBuffer(65536, &bufferSize);
     if (!buffer)
     {
+        RecordNoMemory(path);
         EPStoPSfreeMemory(context);
         return 0;
     }
@@ -268,14 +346,20 @@ unsigned int IsThisEPS(const char* path, void** context)
         info->epsFile = fopen(path, "rb");
         Head head{buffer, bufferSize - 2, 0};
         if (!info->epsFile)
+        {
+            const int error = errno;
             WriteEngineMessage("Error from fopen in IsThisEPS\n");
-        else if (!ReadAt(info->epsFile, 0, head.bytes, head.capacity, &head.got))
-            WriteEngineMessage("Error from fread of header in IsThisEPS\n");
-        else if (LocateProgram(info, head) && ScanHeader(info, head))
+            RecordReadFailure(path, error);
+        }
+        else if (ReadHead(info, head, path) && LocateProgram(info, head, path) &&
+                 ScanHeader(info, head))
             result = 1;
     }
     else
+    {
         WriteEngineMessage("Error from fopen in IsThisEPS\n");
+        RecordFailure(EPS_FAILURE_MISSING, "no file was named");
+    }
 
     ReleaseWorkBuffer(buffer, bufferSize);
     if (!result)

@@ -114,8 +114,9 @@ int RunConvertCommand(const Arguments& args)
     session->Filter().SniffFiles(files, second, rejected, jobs);
     if (jobs.empty())
     {
+        const wxString reason = session->RefusalReason(input.GetFullPath());
         PrintError(input.GetFullPath() + " is not a file the " + session->Info().m_strDisplayName +
-                   " filter accepts");
+                   " filter accepts" + (reason.empty() ? wxString() : ": " + reason));
         return kExitJobsFailed;
     }
 

@@ -8,6 +8,14 @@
 const char kFailureLogName[] = "failed-jobs.log";
 const char kTicketSuffix[] = ".Folder.cfg";
 
+namespace
+{
+wxString RefusalLine(const wxString& path, const wxString& reason)
+{
+    return "refused (left in place): " + path + (reason.empty() ? wxString() : ": " + reason);
+}
+} // namespace
+
 void ServiceReport::Done(const wxString& line)
 {
     ServiceLog(Severity::Info, line);
@@ -19,9 +27,9 @@ void ServiceReport::Failed(const wxString& jobName, const wxString& reason,
     ServiceLog(Severity::Error, jobName + ": failed: " + reason + "; " + original);
 }
 
-void ServiceReport::Refused(const wxString& path)
+void ServiceReport::Refused(const wxString& path, const wxString& reason)
 {
-    ServiceLog(Severity::Warning, "refused (left in place): " + path);
+    ServiceLog(Severity::Warning, RefusalLine(path, reason));
 }
 
 void ServiceReport::Info(const wxString& line)
@@ -56,9 +64,9 @@ void ConsoleReport::Failed(const wxString& jobName, const wxString& reason,
     PrintError(jobName + ": " + reason + "; " + original);
 }
 
-void ConsoleReport::Refused(const wxString& path)
+void ConsoleReport::Refused(const wxString& path, const wxString& reason)
 {
-    m_progress.Note("refused (left in place): " + path);
+    m_progress.Note(RefusalLine(path, reason));
 }
 
 void ConsoleReport::Info(const wxString& line)

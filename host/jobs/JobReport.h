@@ -20,7 +20,8 @@ public:
     // A job failed for reason; what became of its original.
     virtual void Failed(const wxString& jobName, const wxString& reason,
                         const wxString& original) = 0;
-    virtual void Refused(const wxString& path) = 0;
+    // A file no job took, with the filter's reason (empty when it gave none).
+    virtual void Refused(const wxString& path, const wxString& reason) = 0;
     virtual void Info(const wxString& line) = 0;
     virtual void Warning(const wxString& line) = 0;
     virtual void Error(const wxString& line) = 0;
@@ -35,7 +36,7 @@ public:
     void Begin(size_t, size_t, const wxString&) override {}
     void Done(const wxString& line) override;
     void Failed(const wxString& jobName, const wxString& reason, const wxString& original) override;
-    void Refused(const wxString& path) override;
+    void Refused(const wxString& path, const wxString& reason) override;
     void Info(const wxString& line) override;
     void Warning(const wxString& line) override;
     void Error(const wxString& line) override;
@@ -49,7 +50,7 @@ public:
     void Begin(size_t index, size_t total, const wxString& name) override;
     void Done(const wxString& line) override;
     void Failed(const wxString& jobName, const wxString& reason, const wxString& original) override;
-    void Refused(const wxString& path) override;
+    void Refused(const wxString& path, const wxString& reason) override;
     void Info(const wxString& line) override;
     void Warning(const wxString& line) override;
     void Error(const wxString& line) override;

@@ -2,6 +2,9 @@
 
 #include <dlfcn.h>
 
+#include <algorithm>
+#include <string>
+
 static void* FindEntry(void* handle, const char* name)
 {
     return dlsym(handle, name);
@@ -48,6 +51,9 @@ std::unique_ptr<FilterModule> FilterModule::Open(const wxString& path, wxString&
             return nullptr;
         }
     }
+    // Optional: older modules give no reasons for what they refuse.
+    module->m_describeRefusal =
+        reinterpret_cast<DescribeRefusalFn>(FindEntry(handle, "DescribeRefusal"));
     module->m_initialize();
     return module;
 }
@@ -70,4 +76,20 @@ PluginPtr FilterModule::NewInstance(const wxString& name) const
     PluginReleaser releaser;
     releaser.release = m_release;
     return PluginPtr(m_getInstance(name.wc_str()), releaser);
+}
+
+wxString FilterModule::DescribeRefusal(const wxString& path) const
+{
+    const wxCharBuffer native = path.fn_str();
+    if (!m_describeRefusal || !native.data())
+        return wxString();
+    std::string text(256, '\0');
+    size_t length = m_describeRefusal(native.data(), &text[0], text.size());
+    if (length >= text.size())
+    {
+        text.assign(length + 1, '\0');
+        length = m_describeRefusal(native.data(), &text[0], text.size());
+    }
+    text.resize(std::min(length, text.size() - 1));
+    return wxString::FromUTF8(text.data(), text.size());
 }

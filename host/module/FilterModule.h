@@ -15,7 +15,8 @@ struct PluginReleaser
 };
 using PluginPtr = std::unique_ptr<HFPlugin, PluginReleaser>;
 
-// A filter module opened with dlopen and its five entry points found by name.
+// A filter module opened with dlopen and its five entry points found by name
+// (and DescribeRefusal where the module has it).
 class FilterModule
 {
 public:
@@ -30,6 +31,9 @@ public:
     void Describe(PluginInfo& info) const;
     // A fresh filter object, or null when the module could not make one.
     PluginPtr NewInstance(const wxString& name) const;
+    // Why the module's filter does not take the file at path; empty when it
+    // would, or when the module cannot say.
+    wxString DescribeRefusal(const wxString& path) const;
 
 private:
     FilterModule() = default;
@@ -41,4 +45,5 @@ private:
     GetPluginInfoFn m_getInfo = nullptr;
     GetPluginInstanceFn m_getInstance = nullptr;
     ReleasePluginInstanceFn m_release = nullptr;
+    DescribeRefusalFn m_describeRefusal = nullptr;
 };

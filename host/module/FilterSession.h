@@ -25,6 +25,8 @@ public:
     const FilterModule& Module() const { return *m_module; }
     // The filter's own text for a status code, with the code appended.
     wxString DescribeStatus(long code);
+    // Why the filter refused the file at path; empty when it cannot say.
+    wxString RefusalReason(const wxString& path) const { return m_module->DescribeRefusal(path); }
     // Sniffs exactly the listed files of folder (not the whole folder), as a
     // host does for files it has seen arrive.
     void SniffListed(const wxString& folder, const wxArrayString& files, wxArrayString& rejected,

@@ -207,7 +207,7 @@ size_t ServedFolder::TakeBatch(size_t limit, const std::function<bool()>& stop)
         {
             ++m_statistics.refused;
             SetAside(candidate.second);
-            m_report.Refused(candidate.second);
+            m_report.Refused(candidate.second, m_session->RefusalReason(candidate.second));
         }
     if (!jobs.empty() && m_options.delayJobsMs > 0)
     {

@@ -1,4 +1,5 @@
 #pragma once
+#include <string>
 #include <vector>
 
 #include <hotfolder/HFPlugin.h>
@@ -25,6 +26,9 @@ public:
     void GetSupportedFileExtensions(wxArrayString& extensions, wxArrayString& second) override;
     int GetGroupType() override;
     wxWindow* ShowPluginUI(wxWindow* parent) override;
+    // The code a failed Process returned reads with its reason appended
+    // ("Invalid input file: cannot read a.eps: Permission denied") until the
+    // next Process, also after the host initialises the object again.
     bool GetErrorString(long code, wxString& out) override;
     long SniffFiles(const wxArrayString& files, wxArrayString& second, wxArrayString& rejected,
                     JobInfoCollection& jobs) override;
@@ -83,6 +87,8 @@ private:
     long SniffFileList(const wxArrayString& files, wxArrayString& rejected,
                        JobInfoCollection& jobs);
     void ReadUIElement(wxXmlNode* node);
+    // Ends Process with code and the reason the engine recorded.
+    long FailProcess(long code, const std::string& reason);
 
     bool m_bFilterEnabled = false;
     bool m_bOutputTypeIsOne = false;
@@ -99,7 +105,15 @@ private:
     stCustomPageSizeAttribute m_customPageSizeInfo;
     wxString m_strReserved2;
     bool m_bSubstrateFamilySupported = false;
+    long m_lFailureCode = 0; // what the last Process returned when it failed
+    wxString m_strFailureReason;
 };
+
+// Why the filter does not take the file at nativePath (in the file system's
+// encoding) as a job, as a sentence for an operator; "" when the file is EPS.
+// A file named .eps that cannot be read or is a damaged DOS EPS binary gets
+// its reason too: a converting filter takes it so that its job fails with it.
+std::string RefusalReason(const char* nativePath);
 
 // Keys the settings views share.
 extern const wxString ERRORDIFFUSION_KEY;

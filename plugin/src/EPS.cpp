@@ -63,6 +63,8 @@ int EPS::GetGroupType()
 bool EPS::GetErrorString(long code, wxString& out)
 {
     out = GetErrorStringFromID(code);
+    if (code != HF_NO_ERROR && code == m_lFailureCode && !m_strFailureReason.empty())
+        out += ": " + m_strFailureReason;
     return true;
 }
 

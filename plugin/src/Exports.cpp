@@ -1,4 +1,7 @@
 // The module's entry points: the host finds these by name.
+#include <algorithm>
+#include <cstring>
+
 #include "EPS.h"
 #include "FilterVersion.h"
 #include "HFExport.h"
@@ -34,4 +37,23 @@ HF_MODULE_EXPORT HFPlugin* GetPluginInstance(const wchar_t* name)
 HF_MODULE_EXPORT void ReleasePluginInstance(HFPlugin* plugin)
 {
     delete plugin; // virtual: freed by the module that made it
+}
+
+HF_MODULE_EXPORT size_t DescribeRefusal(const char* path, char* text, size_t size)
+{
+    try
+    {
+        const std::string reason = RefusalReason(path);
+        if (text && size > 0)
+        {
+            const size_t copied = std::min(reason.size(), size - 1);
+            std::memcpy(text, reason.data(), copied);
+            text[copied] = '\0';
+        }
+        return reason.size();
+    }
+    catch (...)
+    {
+        return 0; // nothing to say rather than an exception across the C boundary
+    }
 }

@@ -8,6 +8,8 @@
 long EPS::Process(const wxString& /*source*/, const ReadyToProcessJobInfo& job,
                   const wxString& outputFolder, wxString& outputName, IProgressTracker* tracker)
 {
+    m_lFailureCode = HF_NO_ERROR;
+    m_strFailureReason.clear();
     const wxArrayString files = job.files;
     void* context = nullptr;
     if (files.empty())
@@ -16,6 +18,7 @@ long EPS::Process(const wxString& /*source*/, const ReadyToProcessJobInfo& job,
         return m_lStatus = HF_FILTER_NOT_INITIALIZED;
 
     int lastResult = 0;
+    std::string lastReason;
     for (const wxString& path : files)
     {
         const wxFileName input(path, wxPATH_NATIVE);
@@ -43,9 +46,16 @@ long EPS::Process(const wxString& /*source*/, const ReadyToProcessJobInfo& job,
             continue;
         }
 
+        // Earlier outputs stay for the host when a file stops the job.
         if (!IsThisEPS(inputPath.fn_str(), &context))
-            return m_lStatus = HF_INVALID_INPUT_FILE; // earlier outputs stay for the host
+            return FailProcess(HF_INVALID_INPUT_FILE, EPStoPSFailureReason());
+        if (!CheckEPSInput(context))
+        {
+            EPStoPSfreeMemory(&context);
+            return FailProcess(HF_INVALID_INPUT_FILE, EPStoPSFailureReason());
+        }
         lastResult = ConvertEPStoPS(&context, &m_params, outputPath.fn_str());
+        lastReason = EPStoPSFailureReason();
         EPStoPSfreeMemory(&context);
         outputName = outputFile;
         if (tracker)
@@ -59,5 +69,12 @@ long EPS::Process(const wxString& /*source*/, const ReadyToProcessJobInfo& job,
             WriteJobOverrides(outputFolder);
         return m_lStatus;
     }
-    return m_lStatus = HF_FILTER_CONVERSION_FAILED;
+    return FailProcess(HF_FILTER_CONVERSION_FAILED, lastReason);
+}
+
+long EPS::FailProcess(long code, const std::string& reason)
+{
+    m_lFailureCode = code;
+    m_strFailureReason = wxString::FromUTF8(reason);
+    return m_lStatus = code;
 }

@@ -1,4 +1,5 @@
 // Which arriving files the filter takes as jobs.
+#include <cstring>
 #include <utility>
 
 #include <wx/dir.h>
@@ -24,7 +25,34 @@ bool HasEpsExtension(const wxString& name)
             return false;
     return true;
 }
+
+// A file named .eps that the engine cannot read, or a DOS EPS binary whose
+// PostScript section is not in the file, is meant to print: a converting
+// filter takes it, so that its job fails with the reason rather than the
+// file lying in the folder unexplained. Passed through unread, it would be
+// delivered as it is; that filter refuses it as before.
+bool TakenAsBroken(EPSFailureKind_t kind, bool passThrough)
+{
+    return !passThrough && (kind == EPS_FAILURE_UNREADABLE || kind == EPS_FAILURE_DAMAGED);
+}
 } // namespace
+
+std::string RefusalReason(const char* nativePath)
+{
+    if (!nativePath || *nativePath == '\0')
+        return "no file was named";
+    const char* slash = std::strrchr(nativePath, '/');
+    const wxString name(slash ? slash + 1 : nativePath, *wxConvFileName);
+    if (!HasEpsExtension(name))
+        return "not an EPS file: its name does not end in .eps";
+    void* context = nullptr;
+    if (IsThisEPS(nativePath, &context))
+    {
+        EPStoPSfreeMemory(&context);
+        return std::string();
+    }
+    return EPStoPSFailureReason();
+}
 
 EPS::SniffResult EPS::SniffOne(const wxString& path, const char* nativePath,
                                const wxString& filterId, JobInfoCollection& jobs)
@@ -44,9 +72,10 @@ EPS::SniffResult EPS::SniffOne(const wxString& path, const char* nativePath,
         return SniffResult::Refused; // not expressible as a file name here
 
     void* context = nullptr;
-    if (!IsThisEPS(nativePath, &context))
+    if (IsThisEPS(nativePath, &context))
+        EPStoPSfreeMemory(&context);
+    else if (!TakenAsBroken(EPStoPSFailureKind(), m_bOutputTypeIsOne))
         return SniffResult::NotEPS;
-    EPStoPSfreeMemory(&context);
 
     auto* job = new ReadyToProcessJobInfo; // the collection takes it over
     job->filterId = filterId;

@@ -126,17 +126,28 @@ TEST(ConvertOutput, FailuresReleaseTheContextExceptForAnEmptySlot)
     EXPECT_EQ(ConvertEPStoPS(nullptr, &p, scratch.File("a.ps").c_str()), 0);
     void* empty = nullptr;
     EXPECT_EQ(ConvertEPStoPS(&empty, &p, scratch.File("a.ps").c_str()), 0);
+    EXPECT_STREQ(EPStoPSFailureReason(), "no file description was given");
 
     const std::string input = scratch.File("in.eps");
     testkit::WriteFile(input, FilledBoxEps(0, 0, 10, 10));
-    // No folder for the output, no parameters, a full disk: no complete job.
-    for (const char* output : {"no/such/folder/a.ps", "", "/dev/full"})
+    // No folder for the output, no parameters, a full disk: no complete job,
+    // and the reason recorded.
+    const struct
     {
-        SCOPED_TRACE(output);
+        const char* output;
+        const char* reason;
+    } cases[] = {{"no/such/folder/a.ps", "cannot write a.ps: No such file or directory"},
+                 {"", "no output was given"},
+                 {"/dev/full", "cannot write full: No space left on device"}};
+    for (const auto& c : cases)
+    {
+        SCOPED_TRACE(c.output);
         void* context = nullptr;
         ASSERT_EQ(IsThisEPS(input.c_str(), &context), 1u);
-        const std::string path = *output == '/' ? output : scratch.File(output);
-        EXPECT_EQ(ConvertEPStoPS(&context, *output ? &p : nullptr, path.c_str()), 0);
+        const std::string path = *c.output == '/' ? c.output : scratch.File(c.output);
+        EXPECT_EQ(ConvertEPStoPS(&context, *c.output ? &p : nullptr, path.c_str()), 0);
         EXPECT_EQ(context, nullptr);
+        EXPECT_EQ(EPStoPSFailureKind(), EPS_FAILURE_RESOURCES);
+        EXPECT_STREQ(EPStoPSFailureReason(), c.reason);
     }
 }

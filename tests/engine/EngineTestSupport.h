@@ -67,6 +67,47 @@ inline std::string DosEpsHeader(uint32_t offset, uint32_t length)
     return header + "\xFF\xFF"; // checksum
 }
 
+// A file column of the engine's tables as bytes: text with the escapes of
+// Unescape, {dos OFFSET LENGTH} a DOS EPS binary header, {N*TEXT} TEXT N
+// times, {pad N} blanks up to byte N.
+inline std::string FileBytes(const std::string& spec)
+{
+    std::string bytes;
+    for (size_t at = 0; at < spec.size();)
+    {
+        const size_t open = spec.find('{', at);
+        bytes += Unescape(spec.substr(at, open - at));
+        if (open == std::string::npos)
+            break;
+        const size_t close = spec.find('}', open);
+        const std::string inner = spec.substr(open + 1, close - open - 1);
+        std::istringstream words(inner);
+        std::string word;
+        words >> word;
+        if (word == "dos")
+        {
+            uint32_t offset = 0, length = 0;
+            words >> offset >> length;
+            bytes += DosEpsHeader(offset, length);
+        }
+        else if (word == "pad")
+        {
+            size_t size = 0;
+            words >> size;
+            bytes.resize(size, ' ');
+        }
+        else
+        {
+            const size_t star = inner.find('*');
+            const std::string piece = Unescape(inner.substr(star + 1));
+            for (long n = std::stol(inner.substr(0, star)); n > 0; --n)
+                bytes += piece;
+        }
+        at = close + 1;
+    }
+    return bytes;
+}
+
 // A conversion record from words separated by "; ": "page W H", "area LLX
 // LLY URX URY", "pos N", "size W H", "auto" (custom size, scaled), "fit",
 // "shrink", "width" or "height" (proportions kept from that side), "spd TEXT".

@@ -16,45 +16,6 @@ using namespace hf_test;
 
 namespace
 {
-// The file column of the table as bytes.
-std::string FileBytes(const std::string& spec)
-{
-    std::string bytes;
-    for (size_t at = 0; at < spec.size();)
-    {
-        const size_t open = spec.find('{', at);
-        bytes += Unescape(spec.substr(at, open - at));
-        if (open == std::string::npos)
-            break;
-        const size_t close = spec.find('}', open);
-        const std::string inner = spec.substr(open + 1, close - open - 1);
-        std::istringstream words(inner);
-        std::string word;
-        words >> word;
-        if (word == "dos")
-        {
-            uint32_t offset = 0, length = 0;
-            words >> offset >> length;
-            bytes += DosEpsHeader(offset, length);
-        }
-        else if (word == "pad")
-        {
-            size_t size = 0;
-            words >> size;
-            bytes.resize(size, ' ');
-        }
-        else
-        {
-            const size_t star = inner.find('*');
-            const std::string piece = Unescape(inner.substr(star + 1));
-            for (long n = std::stol(inner.substr(0, star)); n > 0; --n)
-                bytes += piece;
-        }
-        at = close + 1;
-    }
-    return bytes;
-}
-
 int OpenDescriptorCount()
 {
     int count = 0;

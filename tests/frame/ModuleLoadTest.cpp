@@ -1,6 +1,7 @@
 // Loads the built module exactly as a host does: dlopen, then the entry
 // points by name, then the interface only. Its dynamic symbol table holds
 // exactly the names of tests/data/frame/exported-symbols.txt.
+#include <cstring>
 #include <set>
 #include <sstream>
 
@@ -78,6 +79,36 @@ TEST_F(LoadedModule, ErrorTextsThroughTheInterface)
         EXPECT_TRUE(plugin->GetErrorString(std::stol(fields[0]), out));
         EXPECT_EQ(out, fields[1]) << "code " << fields[0] << ": " << fields[2];
     }
+}
+
+// The sentence for a refused file through the C entry point: its whole
+// length always, as much of it as fits, always terminated.
+TEST_F(LoadedModule, RefusalReasonsThroughTheEntryPoint)
+{
+    auto describe = Entry<DescribeRefusalFn>("DescribeRefusal");
+    ASSERT_NE(describe, nullptr);
+    testkit::ScratchDir scratch("hf-refusal");
+    const std::string text = scratch.File("letter.eps"), eps = scratch.File("art.eps");
+    testkit::WriteFile(text, "Dear customer,\n");
+    testkit::WriteFile(eps, "%!PS-Adobe-3.0 EPSF-3.0\n%%BoundingBox: 0 0 1 1\n");
+    const std::string reason = "not an EPS file: its first line is not %!PS-Adobe-x.x EPSF-x.x";
+
+    char buffer[128];
+    std::memset(buffer, 'x', sizeof buffer);
+    EXPECT_EQ(describe(text.c_str(), buffer, sizeof buffer), reason.size());
+    EXPECT_EQ(std::string(buffer), reason);
+    std::memset(buffer, 'x', sizeof buffer);
+    EXPECT_EQ(describe(text.c_str(), buffer, 8), reason.size());
+    EXPECT_EQ(std::string(buffer), reason.substr(0, 7)); // cut, and terminated
+    EXPECT_EQ(buffer[8], 'x');                           // nothing written beyond
+    EXPECT_EQ(describe(text.c_str(), nullptr, 0), reason.size());
+    EXPECT_EQ(describe(text.c_str(), buffer, 0), reason.size());
+    EXPECT_EQ(buffer[0], 'n'); // size 0: nothing written at all
+
+    // A file the filter takes has no reason: 0 and an empty text.
+    EXPECT_EQ(describe(eps.c_str(), buffer, sizeof buffer), 0u);
+    EXPECT_EQ(buffer[0], '\0');
+    EXPECT_EQ(describe(nullptr, buffer, sizeof buffer), std::strlen("no file was named"));
 }
 
 TEST(ExportedSymbols, ExactlyTheEntryPoints)

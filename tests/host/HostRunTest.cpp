@@ -63,9 +63,10 @@ TEST_F(HostRun, AFileSpoiltAfterSniffingFailsIntoTheFailedFolderWithALogLine)
     EXPECT_EQ(ListDirectory(Failed(folder)),
               (std::vector<std::string>{"failed-jobs.log", "label.eps"}));
     EXPECT_EQ(ReadFile(Failed(folder) + "/label.eps"), "no longer PostScript\n");
-    EXPECT_NE(
-        ReadFile(Failed(folder) + "/failed-jobs.log").find("label.eps\tInvalid input file (-1005)"),
-        std::string::npos);
+    EXPECT_NE(ReadFile(Failed(folder) + "/failed-jobs.log")
+                  .find("label.eps\tInvalid input file: not an EPS file: its first line is not "
+                        "%!PS-Adobe-x.x EPSF-x.x (-1005)"),
+              std::string::npos);
     EXPECT_NE(host.Err().find("Invalid input file"), std::string::npos);
     EXPECT_NE(host.Out().find("1 done, 1 failed, 0 refused"), std::string::npos) << host.Out();
     EXPECT_TRUE(Exists(folder + "/Output/tiny.ps"));

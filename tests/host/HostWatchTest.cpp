@@ -79,3 +79,50 @@ TEST_F(HostWatchTest, TheStopMarkerEndsTheWatch)
     EXPECT_EQ(run.exitCode, 0);
     EXPECT_TRUE(Exists(folder + "/label.eps"));
 }
+
+// A refused file is reported with its reason once, and once more each time
+// it changes; a file left as it is stays quiet while the folder is looked at
+// again and again.
+TEST_F(HostWatchTest, ARefusalIsReportedOncePerChangeOfTheFile)
+{
+    const std::string folder = MakePostScriptFolder();
+    const std::string note = folder + "/note.eps", memo = folder + "/memo.eps";
+    WriteFile(note, "Dear customer, your order is ready.\n");
+    WriteFile(memo, "Memo\n");
+    BackgroundHost host({"run", folder, "--watch", "--settle", "100"}, scratch);
+    const auto reported = [&](const std::string& path, const std::string& reason)
+    {
+        const std::string line = "refused (left in place): " + path + ": " + reason + "\n";
+        const std::string out = host.Out();
+        size_t count = 0;
+        for (size_t at = out.find(line); at != std::string::npos; at = out.find(line, at + 1))
+            ++count;
+        return count;
+    };
+    const std::string noSignature =
+        "not an EPS file: its first line is not %!PS-Adobe-x.x EPSF-x.x";
+    const std::string tooShort = "not an EPS file: it is shorter than 12 bytes";
+    const std::string empty = "not an EPS file: it is empty";
+    ASSERT_TRUE(WaitFor([&] { return reported(memo, tooShort) == 1; }, 10000)) << host.Out();
+
+    // Emptied: a change, reported with its new reason.
+    WriteFile(memo, "");
+    ASSERT_TRUE(WaitFor([&] { return reported(memo, empty) == 1; }, 10000)) << host.Out();
+    // Only its time changed, found by a later look at the folder: a change too.
+    const timespec times[2] = {{1000000000, 0}, {1000000000, 0}};
+    ASSERT_EQ(utimensat(AT_FDCWD, memo.c_str(), times, 0), 0);
+    ASSERT_TRUE(WaitFor([&] { return reported(memo, empty) == 2; }, 10000)) << host.Out();
+    // Made an EPS file at last, it is taken.
+    WriteFile(memo, ReadFile(kExamples + "/eps/tiny.eps"));
+    ASSERT_TRUE(WaitFor([&] { return Exists(folder + "/Output/memo.ps"); }, 10000)) << host.Out();
+
+    host.Signal(SIGTERM);
+    EXPECT_EQ(host.Wait(10000), 0) << host.Err();
+    // The folder was looked at again all along: the note, unchanged, was
+    // reported once, and so was each earlier state of the memo.
+    EXPECT_EQ(reported(note, noSignature), 1u) << host.Out();
+    EXPECT_EQ(reported(memo, tooShort), 1u);
+    EXPECT_EQ(reported(memo, empty), 2u);
+    EXPECT_TRUE(Exists(note));
+    EXPECT_NE(host.Out().find("1 done, 0 failed, 4 refused"), std::string::npos) << host.Out();
+}

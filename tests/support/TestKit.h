@@ -2,10 +2,12 @@
 // The test kit every test and benchmark shares: scratch folders that are
 // always removed, whole-file reading and writing, programs run from an
 // argument vector (never a shell), waiting for a condition, standard-error
-// capture and a scoped locale that tells why it is missing.
+// capture, a scoped locale that tells why it is missing, and work done as
+// an unprivileged user.
 #include <dirent.h>
 #include <fcntl.h>
 #include <ftw.h>
+#include <grp.h>
 #include <spawn.h>
 #include <sys/stat.h>
 #include <sys/wait.h>
@@ -250,6 +252,74 @@ private:
     int m_saved = -1;
     std::string m_text;
 };
+
+// Tests run as root read every file, so a file made unreadable (mode 000)
+// is read as this user instead (nobody); run as anyone else, the test
+// itself is already refused.
+inline constexpr uid_t kUnprivilegedId = 65534;
+
+inline bool RunsAsRoot()
+{
+    return geteuid() == 0;
+}
+
+// Runs work in a child process, as kUnprivilegedId when the test runs as
+// root, and returns the text work returned; "(no result)" when the child
+// could not drop its rights or did not end normally.
+inline std::string AsUnprivileged(const std::function<std::string()>& work)
+{
+    int channel[2];
+    if (pipe(channel) != 0)
+        return "(no result)";
+    const pid_t pid = fork();
+    if (pid == 0)
+    {
+        close(channel[0]);
+        if (RunsAsRoot() && (setgroups(0, nullptr) != 0 || setgid(kUnprivilegedId) != 0 ||
+                             setuid(kUnprivilegedId) != 0))
+            _exit(1);
+        const std::string text = work();
+        const bool written =
+            write(channel[1], text.data(), text.size()) == static_cast<ssize_t>(text.size());
+        _exit(written ? 0 : 1);
+    }
+    close(channel[1]);
+    std::string text;
+    char buffer[4096];
+    for (ssize_t got; (got = read(channel[0], buffer, sizeof buffer)) > 0;)
+        text.append(buffer, static_cast<size_t>(got));
+    close(channel[0]);
+    return WaitProgram(pid) == 0 ? text : "(no result)";
+}
+
+// The argument vector that runs args as kUnprivilegedId when the test runs
+// as root (through setpriv), else args as they are.
+inline std::vector<std::string> Unprivileged(const std::vector<std::string>& args)
+{
+    if (!RunsAsRoot())
+        return args;
+    std::vector<std::string> all = {"setpriv", "--reuid=" + std::to_string(kUnprivilegedId),
+                                    "--regid=" + std::to_string(kUnprivilegedId), "--clear-groups",
+                                    "--"};
+    all.insert(all.end(), args.begin(), args.end());
+    return all;
+}
+
+// Gives path and everything below it to kUnprivilegedId when the test runs
+// as root, so that Unprivileged programs can work there; false on failure.
+inline bool HandOver(const std::string& path)
+{
+    if (!RunsAsRoot())
+        return true;
+    static bool failed;
+    failed = false;
+    const auto give = [](const char* entry, const struct stat*, int, struct FTW*)
+    {
+        failed = failed || lchown(entry, kUnprivilegedId, kUnprivilegedId) != 0;
+        return 0;
+    };
+    return nftw(path.c_str(), give, 16, FTW_PHYS) == 0 && !failed;
+}
 
 // Switches the process locale (all categories) and switches back at the
 // end. A machine without the locale cannot run the test: use

@@ -1,5 +1,7 @@
 #pragma once
 // The whole host contract of a hot-folder input filter.
+#include <cstddef>
+
 #include <wx/arrstr.h>
 #include <wx/string.h>
 #include "hotfolder/Export.h"
@@ -62,4 +64,11 @@ extern "C"
     typedef void (*GetPluginInfoFn)(PluginInfo*);
     typedef HFPlugin* (*GetPluginInstanceFn)(const wchar_t*);
     typedef void (*ReleasePluginInstanceFn)(HFPlugin*);
+    // Optional, "DescribeRefusal": why the module's filter does not take the
+    // file at path (in the file system's encoding) as a job, a sentence for
+    // an operator in UTF-8. Writes at most size bytes, its terminating NUL
+    // included, into text and returns the sentence's whole length (without
+    // the NUL); 0 when the filter would take the file. A host works without
+    // it when a module lacks it.
+    typedef size_t (*DescribeRefusalFn)(const char* path, char* text, size_t size);
 }
