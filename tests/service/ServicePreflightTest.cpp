@@ -35,8 +35,9 @@ TEST_F(ServiceTest, ThePreflightSwitchAppliesFromTheNextJob)
             rename((scratch + "/staging.eps").c_str(), (folder + "/" + name + ".eps").c_str()), 0);
         const std::string output = folder + "/Output/" + name + ".ps";
         const std::string log = Failed(folder) + "/failed-jobs.log";
-        ASSERT_TRUE(WaitFor(
-            [&] { return Exists(output) || ReadFile(log).find(name) != std::string::npos; }, 30000))
+        // The failure's line is written before the original moves: wait for the move.
+        const std::string failed = Failed(folder) + "/" + name + ".eps";
+        ASSERT_TRUE(WaitFor([&] { return Exists(output) || Exists(failed); }, 30000))
             << host->Err();
         if (c[2] == "delivered")
             EXPECT_TRUE(Exists(output)) << ReadFile(log);
@@ -46,7 +47,7 @@ TEST_F(ServiceTest, ThePreflightSwitchAppliesFromTheNextJob)
             EXPECT_NE(ReadFile(log).find("\t" + name + ".eps\t" + c[2].substr(7) + "\n"),
                       std::string::npos)
                 << ReadFile(log);
-            EXPECT_TRUE(Exists(Failed(folder) + "/" + name + ".eps"));
+            EXPECT_TRUE(Exists(failed));
         }
     }
 }
