@@ -186,8 +186,11 @@ void FolderPrinting::Hold(const std::string& queue, const std::string& reason)
     const wxString why = "printing on " + FromUtf8(queue) + " held: " + FromUtf8(reason);
     if (why == m_held)
         return;
+    // One report per outage: a scheduler going away fails one call after
+    // another, each with its own words; status shows the latest.
+    if (m_held.empty())
+        m_report.Error(why + "; the outputs stay delivered and are sent when it works again");
     m_held = why;
-    m_report.Error(why + "; the outputs stay delivered and are sent when it works again");
     const wxString path = wxFileName(m_container, kHeldName).GetFullPath();
     const wxString temporary = path + ".new";
     {
