@@ -57,4 +57,8 @@ protected:
     std::vector<stPageAttribute> m_sheets;
     stCustomPageSizeAttribute m_customPage;
     Unit_t m_eMeasurementUnit;
+
+private:
+    // Adds the custom size to the paper list, leaving it in points.
+    void ShowCustomPageSize();
 };

@@ -13,6 +13,7 @@
 #include "NumericValidator.h"
 #include "SettingsKeys.h"
 #include "UiText.h"
+#include "UnitChoiceValidator.h"
 #include "utils/CLocaleNumbers.h"
 #include "utils/HFHelper.h"
 
@@ -94,8 +95,8 @@ bool ImageSizePanelWithoutMerge::InitializeControls()
     bind(ID_HEIGHT_RADIO, wxGenericValidator(&m_bHeightDrives));
     bind(ID_WIDTH_TEXT, NumericValidator(&m_strWidth, m_strDecimalSeparator));
     bind(ID_HEIGHT_TEXT, NumericValidator(&m_strHeight, m_strDecimalSeparator));
-    bind(ID_WIDTH_UNIT_COMBO, wxGenericValidator(&m_strWidthUnit));
-    bind(ID_HEIGHT_UNIT_COMBO, wxGenericValidator(&m_strHeightUnit));
+    bind(ID_WIDTH_UNIT_COMBO, UnitChoiceValidator(&m_strWidthUnit));
+    bind(ID_HEIGHT_UNIT_COMBO, UnitChoiceValidator(&m_strHeightUnit));
     bind(ID_AUTOSCALE_RADIO, wxGenericValidator(&m_bAutoScale));
     bind(ID_FITTOPAGE_RADIO, wxGenericValidator(&m_bFitToPage));
     bind(ID_SHRINKTOFIT_RADIO, wxGenericValidator(&m_bShrinkToFit));
@@ -360,7 +361,9 @@ bool ImageSizePanelWithoutMerge::LoadUISettings(MapPropToValue& settings)
     auto loadDimension =
         [&](bool drives, const char* unitKey, const char* valueKey, wxString& unit, wxString& value)
     {
-        unit = m_strMeasurementUnit.empty() ? inch : TranslateUiText(m_strMeasurementUnit);
+        // A server that names no unit leaves the fields without one (and
+        // without a range check).
+        unit = m_strMeasurementUnit.empty() ? wxString() : TranslateUiText(m_strMeasurementUnit);
         const wxString storedUnit = settings[unitKey];
         if ((!m_bConstrain || drives) && !storedUnit.empty())
             unit = storedUnit;

@@ -4,6 +4,16 @@
 
 using namespace SettingsKeys;
 
+namespace
+{
+int WholePointsAsWritten(const wxString& written)
+{
+    double points = 0;
+    ParseSettingDouble(written, points);
+    return static_cast<int>(points);
+}
+} // namespace
+
 const stPageAttribute* FindSheetByDisplayName(const std::vector<stPageAttribute>& sheets,
                                               const wxString& displayName)
 {
@@ -46,10 +56,14 @@ void WriteCustomPageKeys(MapPropToValue& settings, double widthPoints, double he
     settings[CUSTOMPAGEHEIGHT] = FormatSettingDouble(heightPoints);
     settings[CUSTOMPAGETUNIT] = EncodeCustomPageUnit(unit);
     settings[CUSTOMPAGESIZE] = FormatSettingFlag(true);
-    // The device takes whole points; truncation, not rounding, is what it expects.
-    settings[PAGESIZE_COMMAND] = wxString::Format("\n%d %d 0 0 1", static_cast<int>(widthPoints),
-                                                  static_cast<int>(heightPoints)) +
-                                 custom.command;
+    // The device takes whole points; truncation, not rounding, is what it
+    // expects. It truncates the size as written above, so that a size a hair
+    // below a whole point (864 pt typed in millimetres) asks for the 864 the
+    // forced size says, not for 863.
+    settings[PAGESIZE_COMMAND] =
+        wxString::Format("\n%d %d 0 0 1", WholePointsAsWritten(settings[FORCEPAGESIZEX]),
+                         WholePointsAsWritten(settings[FORCEPAGESIZEY])) +
+        custom.command;
 }
 
 wxString CustomPageEntryText(double width, double height, Unit_t unit)

@@ -56,30 +56,42 @@ void PageSizePanelWithoutMerge::AddCustomPageSize()
     paper->SetSelection(paper->GetCount() - 1);
 }
 
+void PageSizePanelWithoutMerge::ShowCustomPageSize()
+{
+    // Only the list entry is in the measurement unit: the points stay as they
+    // are, since points to millimetres and back can come out a hair short of
+    // a whole point, which the page command would then truncate.
+    const double widthPoints = m_dCustomWidth, heightPoints = m_dCustomHeight;
+    convertToUnit(m_dCustomWidth, UNIT_POINT, m_eMeasurementUnit);
+    convertToUnit(m_dCustomHeight, UNIT_POINT, m_eMeasurementUnit);
+    AddCustomPageSize();
+    m_dCustomWidth = widthPoints;
+    m_dCustomHeight = heightPoints;
+}
+
 void PageSizePanelWithoutMerge::OnCustomPageSize(wxCommandEvent&)
 {
     const Unit_t unit = m_eMeasurementUnit;
     double minWidth = m_customPage.MinMediaWidth, maxWidth = m_customPage.MaxMediaWidth;
     double minHeight = m_customPage.MinMediaHeight, maxHeight = m_customPage.MaxMediaHeight;
-    for (double* value :
-         {&minWidth, &maxWidth, &minHeight, &maxHeight, &m_dCustomWidth, &m_dCustomHeight})
+    double width = m_dCustomWidth, height = m_dCustomHeight;
+    for (double* value : {&minWidth, &maxWidth, &minHeight, &maxHeight, &width, &height})
         convertToUnit(*value, UNIT_POINT, unit);
 
     CustomPageSizeDlg dialog(this, wxID_ANY, TranslateUiText("Custom page size"), minWidth,
-                             maxWidth, minHeight, maxHeight, m_dCustomWidth, m_dCustomHeight, unit,
+                             maxWidth, minHeight, maxHeight, width, height, unit,
                              m_customPage.SubstrateHeightToLength);
     dialog.Centre(wxBOTH);
-    if (dialog.ShowModal() == wxID_OK)
-    {
-        m_bCustomPageSize = true;
-        Unit_t dialogUnit = unit;
-        dialog.GetPageSizes(m_dCustomWidth, m_dCustomHeight, dialogUnit);
-        convertToUnit(m_dCustomWidth, dialogUnit, unit);
-        convertToUnit(m_dCustomHeight, dialogUnit, unit);
-        AddCustomPageSize();
-    }
-    convertToUnit(m_dCustomWidth, unit, UNIT_POINT);
-    convertToUnit(m_dCustomHeight, unit, UNIT_POINT);
+    if (dialog.ShowModal() != wxID_OK)
+        return;
+    m_bCustomPageSize = true;
+    Unit_t dialogUnit = unit;
+    dialog.GetPageSizes(width, height, dialogUnit);
+    convertToUnit(width, dialogUnit, UNIT_POINT);
+    convertToUnit(height, dialogUnit, UNIT_POINT);
+    m_dCustomWidth = width;
+    m_dCustomHeight = height;
+    ShowCustomPageSize();
 }
 
 void PageSizePanelWithoutMerge::OnRadioPortrait(wxCommandEvent& event)
@@ -171,14 +183,11 @@ bool PageSizePanelWithoutMerge::LoadUISettings(MapPropToValue& settings)
     m_bCustomPageSize = ReadSettingFlag(settings, CUSTOMPAGESIZE, Defaults::CUSTOMPAGESIZE);
     if (m_bCustomPageSize)
     {
-        convertToUnit(m_dCustomWidth, UNIT_POINT, m_eMeasurementUnit);
-        convertToUnit(m_dCustomHeight, UNIT_POINT, m_eMeasurementUnit);
-        AddCustomPageSize();
-        // The list now shows the custom entry; the bound text must follow it.
-        m_strPageSize = CustomPageEntryText(m_dCustomWidth, m_dCustomHeight, m_eMeasurementUnit);
-        convertToUnit(m_dCustomWidth, m_eMeasurementUnit, UNIT_POINT);
-        convertToUnit(m_dCustomHeight, m_eMeasurementUnit, UNIT_POINT);
+        ShowCustomPageSize();
     }
+    // A paper of the list named by the page size text is what the list shows
+    // (and what a save keeps), even beside a custom flag; any other text
+    // leaves the custom entry selected.
     TransferDataToWindow();
     return OutputFileTypePanelWithoutMerge::LoadUISettings(settings);
 }

@@ -6,6 +6,8 @@
 // page: the user picks a custom page, a corner and an image width, the host
 // saves, a filter set up from that preference converts, and Ghostscript
 // shows the artwork where the user asked.
+#include <memory>
+
 #include <wx/dcmemory.h>
 #include <wx/sizer.h>
 #include <wx/statbox.h>
@@ -47,6 +49,76 @@ std::string Boxes(wxWindow* panel)
 using SettingsPanel = PanelTest;
 using CustomDialog = PanelTest;
 using PanelConversion = PanelTest;
+
+// The panel as the host gets it from a filter, with the steps of
+// tests/data/ui/filter-panel.txt on top of the panel's own: server NAME (a
+// new filter initialised with it); stored K=V, ... (the filter's settings);
+// show (ShowPluginUI); host-ok (SavePreference answers 0); host-refused TEXT
+// (-1 after a message containing TEXT); written N (UI elements the host's
+// node holds); param FIELD=V, ... (the filter's conversion parameters).
+// After show and the saves the panel steps' map is a copy of the filter's.
+class FilterPanel : public PanelTest
+{
+protected:
+    void Step(const std::string& verb, const std::string& arg) override
+    {
+        if (verb == "server")
+        {
+            m_filter = std::make_unique<EPS>("EPS");
+            m_host = std::make_unique<wxXmlNode>(wxXML_ELEMENT_NODE, "Filter");
+            ASSERT_EQ(0, m_filter->Initialize(ServerDescription(arg)));
+        }
+        else if (verb == "stored")
+            for (const auto& [key, value] : Pairs(arg))
+                m_filter->GetSettings()[key] = wxString::FromUTF8(value);
+        else if (verb == "show")
+        {
+            m_panel = wxDynamicCast(m_filter->ShowPluginUI(m_frame), ImageSizePanelWithoutMerge);
+            ASSERT_NE(nullptr, m_panel);
+            m_settings = m_filter->GetSettings();
+        }
+        else if (verb == "host-ok" || verb == "host-refused")
+        {
+            long result = 0;
+            if (verb == "host-ok")
+                result = m_filter->SavePreference(m_host.get());
+            else
+            {
+                auto answer = [&](wxMessageDialog* box)
+                {
+                    EXPECT_NE(wxNOT_FOUND, box->GetMessage().Find(wxString::FromUTF8(arg)));
+                    return int(wxID_OK);
+                };
+                wxTEST_DIALOG(result = m_filter->SavePreference(m_host.get()),
+                              Answer<wxMessageDialog>(answer));
+            }
+            EXPECT_EQ(verb == "host-ok" ? 0 : -1, result);
+            m_settings = m_filter->GetSettings();
+        }
+        else if (verb == "written")
+        {
+            size_t written = 0;
+            for (wxXmlNode* child = m_host->GetChildren(); child; child = child->GetNext())
+                written += child->GetName() == "UI";
+            EXPECT_EQ(std::stoul(arg), written);
+        }
+        else if (verb == "param")
+        {
+            const EPStoPSparams_t& params = m_filter->GetParams();
+            const std::map<std::string, double> fields = {{"pageWidth", params.pageWidth},
+                                                          {"imagePosition", params.imagePosition},
+                                                          {"imageWidth", params.imageWidth},
+                                                          {"autoRotate", params.autoRotate}};
+            for (const auto& [field, value] : Pairs(arg))
+                EXPECT_DOUBLE_EQ(std::stod(value), fields.at(field)) << field;
+        }
+        else
+            PanelTest::Step(verb, arg);
+    }
+
+    std::unique_ptr<EPS> m_filter;
+    std::unique_ptr<wxXmlNode> m_host;
+};
 
 TEST_F(SettingsPanel, ScenariosAsTabled)
 {
@@ -142,6 +214,52 @@ TEST_F(SettingsPanel, TabOrderFollowsTheLayout)
     wxWindow* focus = wxWindow::FindFocus();
     ASSERT_NE(nullptr, focus);
     EXPECT_TRUE(focus == Control("width-unit") || focus->GetParent() == Control("width-unit"));
+}
+
+TEST_F(FilterPanel, ShownAndSavedAsTabled)
+{
+    RunScenarios("ui/filter-panel.txt");
+}
+
+// Opening the settings and pressing OK must not change a custom page: the
+// command's whole points and the forced size agree with what was stored,
+// in every unit the list can show.
+TEST_F(SettingsPanel, CustomPagesOfWholePointsSurviveLoadAndSave)
+{
+    for (const auto& row : testkit::Cases("ui/custom-page-whole-points.txt", 4, 3))
+    {
+        SCOPED_TRACE(row[3]);
+        if (m_panel)
+            m_panel->Destroy();
+        m_settings.clear();
+        Build();
+        auto& paper = Need<wxComboBox>("page");
+        const unsigned papers = paper.GetCount();
+        std::vector<int> changed;
+        wxString firstCommand;
+        for (int size = std::stoi(row[1]); size <= std::stoi(row[2]); ++size)
+        {
+            const wxString points = wxString::Format("%d.000000", size);
+            m_settings["OUTPUTFILETYPEEPS"] = "0";
+            m_settings["CUSTOMPAGESIZE"] = "1";
+            m_settings["CUSTOMPAGETUNIT"] = row[0];
+            m_settings["DEFAULTPAGESIZE"] = "custom"; // no paper: the custom entry stays chosen
+            m_settings["CUSTOMPAGEWIDTH"] = m_settings["CUSTOMPAGEHEIGHT"] = points;
+            m_panel->LoadUISettings(m_settings);
+            const bool kept = m_panel->GetCustomWidthPoints() == size && Save(m_settings) &&
+                              m_settings["FORCEPAGESIZEX"] == points &&
+                              m_settings["FORCEPAGESIZEY"] == points &&
+                              m_settings["PAGESIZE_COMMAND"].StartsWith(
+                                  wxString::Format("\n%d %d 0 0 1 ", size, size));
+            if (!kept && changed.empty())
+                firstCommand = m_settings["PAGESIZE_COMMAND"];
+            if (!kept)
+                changed.push_back(size);
+            paper.Delete(papers); // the entry this load added
+        }
+        EXPECT_TRUE(changed.empty()) << changed.size() << " sizes changed, the first "
+                                     << changed.front() << ": " << firstCommand;
+    }
 }
 
 TEST_F(CustomDialog, CasesAsTabled)

@@ -84,6 +84,24 @@ inline wxString TestDataText(const std::string& relative)
     return wxString::FromUTF8(testkit::ReadFile(HF_TEST_DATA_DIR "/" + relative));
 }
 
+// The server description of tests/data/ui/server-NAME.xml; "NAME without
+// ELEMENT" leaves that element (and what it holds) out.
+inline wxString ServerDescription(const std::string& server)
+{
+    const size_t without = server.find(" without ");
+    wxString xml = TestDataText("ui/server-" + server.substr(0, without) + ".xml");
+    if (without != std::string::npos)
+    {
+        const wxString element = wxString::FromUTF8(server.substr(without + 9));
+        const size_t start = xml.find("<" + element + ">");
+        const size_t end = xml.find("</" + element + ">");
+        if (start == wxString::npos || end == wxString::npos)
+            throw std::runtime_error("no element " + server);
+        xml.erase(start, end + element.length() + 3 - start);
+    }
+    return xml;
+}
+
 class PanelTest : public ::testing::Test
 {
 protected:
@@ -113,7 +131,7 @@ protected:
 
     void Build(bool enabled = true, const std::string& server = "ui")
     {
-        const wxString xml = TestDataText("ui/server-" + server + ".xml");
+        const wxString xml = ServerDescription(server);
         m_panel = wxDynamicCast(ImageSizePanelWithoutMerge_Factory::CreateInstance(
                                     m_frame, xml, "EPS", ".eps", enabled, enabled),
                                 ImageSizePanelWithoutMerge);
@@ -188,7 +206,7 @@ protected:
     }
 
     // Runs one step; `arg` is the rest of the step after the first blank.
-    void Step(const std::string& verb, const std::string& arg)
+    virtual void Step(const std::string& verb, const std::string& arg)
     {
         const auto [name, value] =
             Pairs(arg).empty() ? std::pair<std::string, std::string>() : Pairs(arg).front();
@@ -278,6 +296,16 @@ protected:
         else if (verb == "no-comma")
             for (const auto& entry : m_settings)
                 EXPECT_FALSE(entry.second.Contains(",")) << entry.first;
+        else if (verb == "values") // the map's entries that are not empty, exactly
+        {
+            std::map<std::string, std::string> expected, held;
+            for (const auto& [key, stored] : Pairs(arg))
+                expected[key] = stored;
+            for (const auto& entry : m_settings)
+                if (!entry.second.empty())
+                    held[entry.first.utf8_string()] = entry.second.utf8_string();
+            EXPECT_EQ(expected, held);
+        }
         else if (verb == "saved" || verb == "exactly") // the whole map (saved: defaults changed)
         {
             std::map<std::string, std::string> expected, saved;
@@ -300,7 +328,7 @@ protected:
         else if (verb == "page-size")
             EXPECT_EQ(wxString::FromUTF8(arg), m_panel->GetPageSize());
         else if (verb == "custom-width")
-            EXPECT_DOUBLE_EQ(std::stod(arg), m_panel->GetCustomWidthPoints());
+            EXPECT_EQ(std::stod(arg), m_panel->GetCustomWidthPoints());
         else if (verb == "entries")
             EXPECT_EQ(std::stoul(value), Need<wxComboBox>(name).GetCount());
         else if (verb == "dialog") // limits and size in points, shown in a unit
