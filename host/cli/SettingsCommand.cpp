@@ -34,7 +34,8 @@
 static const char kSettingsUsage[] =
     "usage: hotfolder settings FOLDER [--show | --set KEY=VALUE ... | --accept]\n"
     "                          [--server FILE | --ppd FILE.ppd | --printer QUEUE|none]\n"
-    "                          [--preflight on|off] [--module PATH]\n"
+    "                          [--preflight on|off]\n"
+    "                          [--module PATH]\n"
     "\n"
     "Without options, opens the filter's settings panel in a window; OK stores\n"
     "the settings in the folder's Folder.cfg, Cancel leaves them alone.\n"
@@ -103,12 +104,7 @@ int ShowSettings(const HotFolder& folder, const wxString& identifier,
     wxXmlNode filter = StoredFilter(folder, identifier);
     SettingList stored = ReadFilterSettings(&filter);
     auto line = [](const wxString& key, const wxString& value, const wxString& note)
-    {
-        wxString text = key + "=" + posix::ShownLine(value) + "  ";
-        while (text.length() < 36)
-            text += ' ';
-        PrintLine(text + "# " + note);
-    };
+    { PrintLine(key + "=" + posix::ShownLine(value) + "  # " + note); };
     for (const wxString& key : KnownSettingKeys())
     {
         auto found = std::find_if(stored.begin(), stored.end(),
