@@ -1,6 +1,9 @@
 // hotfolder convert: one file through the filter, outside any hot folder.
+#include <cerrno>
+#include <cstring>
 #include <memory>
 #include <sys/stat.h>
+#include <unistd.h>
 
 #include <wx/filename.h>
 #include <wx/log.h>
@@ -20,15 +23,23 @@
 #include "SettingsKeys.h"
 
 static const char kConvertUsage[] =
-    "usage: hotfolder convert IN.eps [-o OUT.ps] [--server FILE] [--set KEY=VALUE ...]\n"
-    "                         [--module PATH]\n"
+    "usage: hotfolder convert IN.eps [-o OUT.ps] [--force] [--server FILE]\n"
+    "                         [--set KEY=VALUE ...] [--module PATH]\n"
     "\n"
     "Converts one EPS file to PostScript with the filter's default settings,\n"
     "changed by --set (see 'hotfolder settings --help' for the keys). OUT.ps\n"
     "defaults to IN with the extension .ps, next to it. With --server the\n"
     "filter learns the server's papers; DEFAULTPAGESIZE=<paper> then also sets\n"
     "that paper's size and imageable area, and without it the server's default\n"
-    "paper is used. Without a paper the page takes the artwork's own size.\n";
+    "paper is used. Without a paper the page takes the artwork's own size.\n"
+    "An existing OUT.ps is left alone unless --force says to replace it.\n";
+
+// Anything under the name, a dangling link too.
+static bool Exists(const wxString& path)
+{
+    struct stat info;
+    return lstat(path.fn_str(), &info) == 0;
+}
 
 static bool SameFile(const wxString& a, const wxString& b)
 {
@@ -43,6 +54,7 @@ int RunConvertCommand(const Arguments& args)
     int status = 0;
     if (!ParseCommandLine(args,
                           {{"--output", true, false, "-o"},
+                           {"--force", false, false, ""},
                            {"--server", true, false, ""},
                            {"--set", false, true, ""}},
                           kConvertUsage, 1, 1, parsed, status))
@@ -63,6 +75,12 @@ int RunConvertCommand(const Arguments& args)
     if (SameFile(input.GetFullPath(), output.GetFullPath()))
     {
         PrintError("the output would replace the input " + input.GetFullPath());
+        return kExitUsage;
+    }
+    const bool replace = parsed.Has("--force");
+    if (!replace && Exists(output.GetFullPath()))
+    {
+        PrintError(output.GetFullPath() + " exists already; --force replaces it");
         return kExitUsage;
     }
 
@@ -150,7 +168,16 @@ int RunConvertCommand(const Arguments& args)
             delivered = CopyFileTo(result.producedPath, produced, error);
         }
         wxLogNull quiet;
-        delivered = delivered && wxRenameFile(produced, target, true);
+        // Without --force a file that appeared meanwhile is kept: link()
+        // refuses an existing name, where a rename would replace it.
+        if (delivered && !replace && link(produced.fn_str(), target.fn_str()) != 0)
+        {
+            delivered = false;
+            error = errno == EEXIST ? target + " exists already; --force replaces it"
+                                    : "cannot write " + target + ": " + FromUtf8(strerror(errno));
+        }
+        else if (delivered)
+            delivered = replace ? wxRenameFile(produced, target, true) : true;
         if (!delivered)
         {
             if (error.empty())

@@ -1,8 +1,6 @@
 // hotfolder init: makes a folder a hot folder.
 #include <cstdio>
-#include <fstream>
 #include <memory>
-#include <sstream>
 #include <string>
 
 #include <wx/filename.h>
@@ -13,6 +11,7 @@
 #include "cli/ConsoleText.h"
 #include "service/FolderAccess.h"
 #include "cli/QueueBinding.h"
+#include "cli/ServerBinding.h"
 #include "folder/FileMoves.h"
 #include "module/FilterSession.h"
 #include "folder/HotFolder.h"
@@ -21,7 +20,6 @@
 #include "db/AtomicFile.h"
 #include "db/HFDatabase.h"
 #include "db/PathResolver.h"
-#include "ServerFromPpd.h"
 
 static const char kInitUsage[] =
     "usage: hotfolder init FOLDER [--server FILE | --ppd FILE.ppd | --printer QUEUE]\n"
@@ -75,28 +73,6 @@ bool IsListed(const wxString& folder)
         if (wxFileName::DirName(listed).SameAs(wxFileName::DirName(folder)))
             return true;
     return false;
-}
-
-// The description of the printer a PPD file describes, and the file's bytes.
-bool LoadPpdServer(const std::string& ppd, ServerDescription& server, std::string& bytes,
-                   wxString& error)
-{
-    wxString xml;
-    std::string reason;
-    if (!printing::ServerDescriptionFromPpd(ppd, xml, reason))
-    {
-        error = FromUtf8(reason);
-        return false;
-    }
-    std::ifstream in(ppd, std::ios::binary);
-    std::ostringstream content;
-    if (!in || !(content << in.rdbuf()))
-    {
-        error = "cannot read " + FromUtf8(ppd);
-        return false;
-    }
-    bytes = content.str();
-    return server.LoadText(xml, FromUtf8(ppd), error);
 }
 
 bool ParseInitRequest(const Arguments& args, InitRequest& request, int& status)
@@ -175,11 +151,7 @@ bool StoreServer(const InitRequest& request, const InitPlan& plan)
 {
     if (plan.server.IsEmpty())
         return true;
-    if (!StoreBeside(request.folder, HotFolder::kServerDescriptionName,
-                     ToUtf8(plan.server.GetText()), "server description"))
-        return false;
-    if (!plan.ppdBytes.empty() && !StoreBeside(request.folder, HotFolder::kServerPpdName,
-                                               plan.ppdBytes, "printer description"))
+    if (!StoreServerBeside(request.folder, plan.server, plan.ppdBytes))
         return false;
     if (!request.queue.empty() && !StoreBeside(request.folder, HotFolder::kPrinterQueueName,
                                                request.queue + "\n", "printer queue"))

@@ -1,6 +1,9 @@
 // hotfolder settings: show or change a hot folder's filter settings, from
 // the command line or in the filter's own settings panel.
+#include <algorithm>
+#include <cstdio>
 #include <memory>
+#include <set>
 
 #include <wx/app.h>
 #include <wx/button.h>
@@ -15,27 +18,42 @@
 #include "cli/CommandSupport.h"
 #include "cli/ConsoleText.h"
 #include "cli/QueueBinding.h"
+#include "cli/ServerBinding.h"
 #include "module/FilterSession.h"
 #include "module/FilterSettings.h"
+#include "module/SettingDefaults.h"
+#include "module/SettingWarnings.h"
 #include "folder/HotFolder.h"
 #include "module/ModuleLocator.h"
 #include "folder/ServerDescription.h"
 #include "folder/ServerPapers.h"
+#include "PageSizeKeys.h"
+#include "SettingsKeys.h"
+#include "posix/NativePath.h"
 
 static const char kSettingsUsage[] =
     "usage: hotfolder settings FOLDER [--show | --set KEY=VALUE ... | --accept]\n"
-    "                          [--printer QUEUE|none] [--preflight on|off]\n"
+    "                          [--server FILE | --ppd FILE.ppd | --printer QUEUE|none]\n"
+    "                          [--preflight on|off]\n"
     "                          [--module PATH]\n"
     "\n"
     "Without options, opens the filter's settings panel in a window; OK stores\n"
     "the settings in the folder's Folder.cfg, Cancel leaves them alone.\n"
     "\n"
-    "  --show     print the stored settings, one KEY=VALUE a line\n"
+    "  --show     print every setting in the filter's order, one KEY=VALUE a\n"
+    "             line, with what the settings window takes when it is not set\n"
     "  --set      change settings without a window; unknown keys and malformed\n"
-    "             values are refused and nothing is changed. DEFAULTPAGESIZE\n"
-    "             names one of the server's papers and also sets its page size,\n"
-    "             imageable area and page command. Flags take 1 or 0.\n"
+    "             or out-of-range values are refused and nothing is changed.\n"
+    "             DEFAULTPAGESIZE names one of the server's papers and also sets\n"
+    "             its page size, imageable area and page command. Flags take 1\n"
+    "             or 0. A value that is stored but will not do what it suggests\n"
+    "             (PostScript chosen while EPS passes through, fitting without\n"
+    "             auto-scale, a paper without a server, ...) gets a warning\n"
     "  --accept   open the window and close it with OK at once (scripts, tests)\n"
+    "  --server FILE, --ppd FILE.ppd\n"
+    "             bind the folder to another server description, or to one made\n"
+    "             from a printer's PPD (kept beside it), as init does; a folder\n"
+    "             bound to a CUPS queue no longer prints there\n"
     "  --printer  bind the folder to the CUPS queue QUEUE: its papers become the\n"
     "             folder's server description and the service prints every\n"
     "             output there; 'none' prints nowhere, outputs stay in Output\n"
@@ -49,9 +67,9 @@ static const char kSettingsUsage[] =
     "      AUTOROTATE ORIENTATIONPOTRAIT ORIENTATIONLANDSCAPE FORCEPAGESIZEX/Y\n"
     "      IMAGEEABLESIZELLX/LLY/URX/URY CUSTOMPAGEWIDTH/HEIGHT CUSTOMPAGETUNIT\n"
     "      PAGESIZE_COMMAND ORIGINALSIZE CUSTOMSIZE CONTRAINPROPORTION\n"
-    "      ORIGINALWIDTH ORIGINALHEIGHT ORIGINALWIDTHUNIT ORIGINALHEIGHTUNIT\n"
-    "      ORIGINALWIDTHOPTION ORIGINALHEIGHTOPTION FORCEAUTOSCALE FITTOPAGE\n"
-    "      SHRINKTOFIT SCALETOPRINT\n";
+    "      ORIGINALWIDTH ORIGINALHEIGHT (in the settings window's range for the unit)\n"
+    "      ORIGINALWIDTHUNIT ORIGINALHEIGHTUNIT ORIGINALWIDTHOPTION\n"
+    "      ORIGINALHEIGHTOPTION FORCEAUTOSCALE FITTOPAGE SHRINKTOFIT SCALETOPRINT\n";
 
 namespace
 {
@@ -75,11 +93,31 @@ wxString Identifier(const wxString& modulePath, wxString& error)
     return info.m_strIdentifier;
 }
 
-int ShowSettings(const HotFolder& folder, const wxString& identifier)
+// Every key in catalogue order, then whatever else is stored. Values are
+// shown on one line each (a page command holds line breaks).
+int ShowSettings(const HotFolder& folder, const wxString& identifier,
+                 const ServerDescription& server)
 {
+    ServerPapers papers;
+    if (!server.IsEmpty())
+        papers.Load(server.GetText());
     wxXmlNode filter = StoredFilter(folder, identifier);
-    for (const auto& setting : ReadFilterSettings(&filter))
-        PrintLine(setting.first + "=" + setting.second);
+    SettingList stored = ReadFilterSettings(&filter);
+    auto line = [](const wxString& key, const wxString& value, const wxString& note)
+    { PrintLine(key + "=" + posix::ShownLine(value) + "  # " + note); };
+    for (const wxString& key : KnownSettingKeys())
+    {
+        auto found = std::find_if(stored.begin(), stored.end(),
+                                  [&](const auto& setting) { return setting.first == key; });
+        const wxString value = found == stored.end() ? wxString() : found->second;
+        if (found != stored.end())
+            stored.erase(found);
+        line(key, value,
+             (value.empty() ? "not set; default: " : "default: ") +
+                 DescribeSettingDefault(key, papers.sheets));
+    }
+    for (const auto& setting : stored)
+        line(setting.first, setting.second, "not a setting of this filter");
     return kExitSuccess;
 }
 
@@ -90,7 +128,8 @@ int SetSettings(HotFolder& folder, const wxString& identifier, const ServerDescr
     papers.Load(server.GetText());
     wxXmlNode filter = StoredFilter(folder, identifier);
     wxString error;
-    if (!ApplySettingAssignments(&filter, assignments, papers.sheets, error))
+    std::set<wxString> changed;
+    if (!ApplySettingAssignments(&filter, assignments, papers.sheets, error, &changed))
     {
         PrintError(error);
         return kExitUsage;
@@ -101,7 +140,53 @@ int SetSettings(HotFolder& folder, const wxString& identifier, const ServerDescr
         return kExitSetupFailed;
     }
     PrintLine("Settings of " + folder.GetFolder() + " updated.");
+    for (const wxString& warning :
+         SettingWarnings(ReadFilterSettings(&filter), changed, !server.IsEmpty()))
+        PrintError("warning: " + warning);
     return kExitSuccess;
+}
+
+// Binds the folder to the server of --server or --ppd, as init stores one.
+// A queue binding goes: the queue's description is not the folder's now.
+bool RebindServer(HotFolder& folder, const std::string& serverFile, const std::string& ppdFile)
+{
+    ServerDescription server;
+    std::string ppdBytes;
+    wxString error;
+    const wxString origin = FromUtf8(serverFile.empty() ? ppdFile : serverFile);
+    if (!(serverFile.empty() ? LoadPpdServer(ppdFile, server, ppdBytes, error)
+                             : server.Load(origin, error)))
+    {
+        PrintError(error);
+        return false;
+    }
+    const std::string queue = folder.GetBoundQueue();
+    if (!StoreServerBeside(folder.GetFolder(), server, ppdBytes) ||
+        (!queue.empty() && !UnbindFolder(folder.GetFolder())))
+        return false;
+    PrintLine(folder.GetFolder() + " now submits to the server of " + origin +
+              (queue.empty() ? wxString()
+                             : "; it no longer prints on " + FromUtf8(queue) +
+                                   ", outputs stay in " + folder.GetDefaultOutputFolder()));
+    return true;
+}
+
+// A stored paper the new server does not offer would leave the page to the
+// old server's values.
+void WarnAboutStoredPaper(const HotFolder& folder, const wxString& identifier,
+                          const ServerDescription& server)
+{
+    wxXmlNode filter = StoredFilter(folder, identifier);
+    for (const auto& setting : ReadFilterSettings(&filter))
+        if (setting.first == SettingsKeys::DEFAULTPAGESIZE && !setting.second.empty())
+        {
+            ServerPapers papers;
+            papers.Load(server.GetText());
+            if (!FindSheetByPaperName(papers.sheets, setting.second))
+                PrintError("warning: the server offers no paper " + setting.second +
+                           " (DEFAULTPAGESIZE); the page keeps the old paper's size until "
+                           "--set DEFAULTPAGESIZE names one of its papers");
+        }
 }
 
 // The "Status" entry of the folder's PreflightSettings; the other entries stay.
@@ -204,10 +289,19 @@ int RunSettingsCommand(int argc, char** argv, const Arguments& args)
                           {{"--show", false, false, ""},
                            {"--set", false, true, ""},
                            {"--accept", false, false, ""},
+                           {"--server", true, false, ""},
+                           {"--ppd", true, false, ""},
                            {"--printer", true, false, ""},
                            {"--preflight", true, false, ""}},
                           kSettingsUsage, 1, 1, parsed, status))
         return status;
+    const bool rebinds = parsed.Has("--server") || parsed.Has("--ppd");
+    if (parsed.Has("--server") + parsed.Has("--ppd") + parsed.Has("--printer") > 1)
+    {
+        PrintError("only one of --server, --ppd and --printer can be given");
+        std::fputs(kSettingsUsage, stderr);
+        return kExitUsage;
+    }
     const std::string preflight = parsed.Get("--preflight");
     if (parsed.Has("--preflight") && preflight != "on" && preflight != "off")
     {
@@ -215,7 +309,7 @@ int RunSettingsCommand(int argc, char** argv, const Arguments& args)
         return kExitUsage;
     }
     const bool windowed = !parsed.Has("--show") && !parsed.Has("--set") &&
-                          !parsed.Has("--printer") && !parsed.Has("--preflight");
+                          !parsed.Has("--printer") && !parsed.Has("--preflight") && !rebinds;
     std::unique_ptr<wxInitializer> initializer;
     if (!windowed)
     {
@@ -268,6 +362,18 @@ int RunSettingsCommand(int argc, char** argv, const Arguments& args)
         if (!OpenFolderAndServer(parsed.positionals[0], folder, server))
             return kExitSetupFailed;
     }
+    const wxString modulePath = LocateFilterModule(FromUtf8(parsed.Get("--module")));
+    if (rebinds)
+    {
+        if (!RebindServer(folder, parsed.Get("--server"), parsed.Get("--ppd")) ||
+            !OpenFolderAndServer(parsed.positionals[0], folder, server))
+            return kExitSetupFailed;
+        const wxString identifier = Identifier(modulePath, error);
+        if (!identifier.empty())
+            WarnAboutStoredPaper(folder, identifier, server);
+        if (!parsed.Has("--set") && !parsed.Has("--show") && !parsed.Has("--preflight"))
+            return kExitSuccess;
+    }
     if (parsed.Has("--preflight"))
     {
         if (!SavePreflightSwitch(folder, preflight == "on"))
@@ -275,7 +381,6 @@ int RunSettingsCommand(int argc, char** argv, const Arguments& args)
         if (!parsed.Has("--set") && !parsed.Has("--show"))
             return kExitSuccess;
     }
-    const wxString modulePath = LocateFilterModule(FromUtf8(parsed.Get("--module")));
     if (windowed)
         return EditInWindow(folder, modulePath, server, parsed.Has("--accept"));
 
@@ -287,5 +392,5 @@ int RunSettingsCommand(int argc, char** argv, const Arguments& args)
     }
     if (parsed.Has("--set"))
         return SetSettings(folder, identifier, server, parsed.All("--set"));
-    return ShowSettings(folder, identifier);
+    return ShowSettings(folder, identifier, server);
 }

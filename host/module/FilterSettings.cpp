@@ -1,12 +1,14 @@
 #include "module/FilterSettings.h"
 
 #include <map>
+#include <set>
 
 #include <wx/xml/xml.h>
 
 #include "cli/CommandLine.h"
 #include "cli/ConsoleText.h"
 #include "PageSizeKeys.h"
+#include "module/DimensionLimits.h"
 #include "module/SettingCatalogue.h"
 #include "SettingsKeys.h"
 
@@ -71,9 +73,11 @@ static wxString PaperNames(const std::vector<stPageAttribute>& sheets)
 }
 
 bool ApplySettingAssignments(wxXmlNode* filter, const std::vector<std::string>& assignments,
-                             const std::vector<stPageAttribute>& sheets, wxString& error)
+                             const std::vector<stPageAttribute>& sheets, wxString& error,
+                             std::set<wxString>* changedKeys)
 {
     std::vector<std::pair<wxString, wxString>> explicitValues;
+    std::set<wxString> changed;
     const stPageAttribute* paper = nullptr;
     for (const std::string& assignment : assignments)
     {
@@ -98,16 +102,25 @@ bool ApplySettingAssignments(wxXmlNode* filter, const std::vector<std::string>& 
             stored = paper->PaperName;
         }
         explicitValues.emplace_back(key, stored);
+        changed.insert(key);
     }
+    // Written to a copy first: a dimension is checked against its unit as
+    // both will be stored, and a refusal must leave the settings untouched.
+    wxXmlNode updated(*filter);
     if (paper)
     {
         MapPropToValue pageKeys;
         WriteSheetPageKeys(pageKeys, *paper);
         pageKeys[SettingsKeys::CUSTOMPAGESIZE] = FormatSettingFlag(false);
         for (const auto& entry : pageKeys)
-            WriteFilterSetting(filter, entry.first, entry.second);
+            WriteFilterSetting(&updated, entry.first, entry.second);
     }
     for (const auto& entry : explicitValues)
-        WriteFilterSetting(filter, entry.first, entry.second);
+        WriteFilterSetting(&updated, entry.first, entry.second);
+    if (!CheckImageDimensions(ReadFilterSettings(&updated), changed, error))
+        return false;
+    *filter = updated;
+    if (changedKeys)
+        *changedKeys = changed;
     return true;
 }

@@ -1,4 +1,5 @@
 #pragma once
+#include <set>
 #include <string>
 #include <utility>
 #include <vector>
@@ -22,5 +23,7 @@ void WriteFilterSetting(wxXmlNode* filter, const wxString& key, const wxString& 
 // when one is refused. Choosing DEFAULTPAGESIZE of one of the server's
 // papers also writes that paper's page size, imageable box and command, as
 // the settings panel does; explicit assignments of those keys still win.
+// changedKeys, when given, receives the keys assigned.
 bool ApplySettingAssignments(wxXmlNode* filter, const std::vector<std::string>& assignments,
-                             const std::vector<stPageAttribute>& sheets, wxString& error);
+                             const std::vector<stPageAttribute>& sheets, wxString& error,
+                             std::set<wxString>* changedKeys = nullptr);

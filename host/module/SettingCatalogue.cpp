@@ -4,11 +4,23 @@
 
 namespace
 {
+// Digits with at most one decimal separator, as the panels' fields take
+// them: no sign, exponent, hexadecimal, infinity or "nan".
 bool ParseNumber(const wxString& text, double& number)
 {
     wxString dotted = text.Strip(wxString::both);
     dotted.Replace(",", "."); // a decimal comma typed by habit
-    return !dotted.empty() && dotted.ToCDouble(&number) && std::isfinite(number);
+    bool digit = false, separator = false;
+    for (wxUniChar c : dotted)
+    {
+        if (c == '.' && !separator)
+            separator = true;
+        else if (c >= '0' && c <= '9')
+            digit = true;
+        else
+            return false;
+    }
+    return digit && dotted.ToCDouble(&number) && std::isfinite(number);
 }
 } // namespace
 
@@ -52,7 +64,9 @@ bool NormaliseSettingValue(const wxString& key, const wxString& value, wxString&
     case SettingKind::Length:
         if (!ParseNumber(value, number) || number <= 0)
         {
-            error = wxString::Format("%s takes a positive number, not \"%s\"", key, value);
+            error = wxString::Format(
+                "%s takes a positive number such as 2.5 (digits and one decimal point), not \"%s\"",
+                key, value);
             return false;
         }
         stored = value.Strip(wxString::both);

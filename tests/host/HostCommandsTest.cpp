@@ -26,3 +26,7 @@ TEST_F(HostScript, SettingsWindow)
         GTEST_SKIP() << "needs a display (the suite runs under xvfb-run)";
     Run("window.txt");
 }
+TEST_F(HostScript, RefusalsAndWarnings)
+{
+    Run("guards.txt");
+}
