@@ -15,7 +15,7 @@ Usage:
                     [--since REV] [--sample N] [--list] [--keep] [--results FILE]
 
   --area A      only mutate this product folder (repeatable): epsconvert,
-                plugin, db, clientapp, utils, settings_ui, sdk, host, printing,
+                plugin, db, clientapp, utils, settings_core, settings_ui, sdk, host, printing,
                 posix
   --per-file N  at most N mutants drawn from each file (default 3)
   --since REV   only mutate lines added or changed since the git revision REV
@@ -53,6 +53,7 @@ AREAS = OrderedDict([
     ("clientapp", ["store", "server", "machine", "fuzz"]),
     ("db", ["store", "machine", "server", "filter", "fuzz"]),
     ("utils", ["units", "machine", "fuzz"]),
+    ("settings_core", ["units", "ui", "filter", "store", "host"]),
     ("settings_ui", ["units", "ui", "filter"]),
     ("sdk", ["frame", "units"]),
     ("host", ["host", "service"]),
