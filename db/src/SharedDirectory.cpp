@@ -7,12 +7,14 @@ namespace db
 {
 void MakeSharedDirectory(const wxString& directory, bool withParents)
 {
-    const std::string path = posix::NativePath(directory);
+    std::string path = posix::NativePath(directory);
+    while (path.size() > 1 && path.back() == '/')
+        path.pop_back();
     if (path.empty())
         return;
-    if (withParents)
-        posix::MakeDirectories(path, 0777, posix::DirectoryMode::Exact);
-    else
-        posix::MakeDirectory(path, 0777, posix::DirectoryMode::Exact);
+    const size_t slash = path.rfind('/');
+    if (withParents && slash != std::string::npos && slash > 0)
+        posix::MakeDirectories(path.substr(0, slash), 0777); // as mkdir makes them
+    posix::MakeDirectory(path, 0777, posix::DirectoryMode::Exact);
 }
 } // namespace db

@@ -3,13 +3,16 @@
 #include "FileSystemUtils.h"
 
 #include <fcntl.h>
-#include <ftw.h>
 #include <linux/fs.h>
 #include <sys/ioctl.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <string>
+#include <vector>
+
 #include "posix/Directories.h"
+#include "posix/UniqueDir.h"
 #include "posix/UniqueFd.h"
 
 namespace
@@ -38,36 +41,67 @@ bool ClearImmutableFlag(const char* path, const struct stat& info)
     return true;
 }
 
-thread_local bool walkOk = true;
-
-int MakeEntryWritable(const char* path, const struct stat* info, int type, struct FTW*)
+bool IsDotOrDotDot(const char* name)
 {
-    if (type == FTW_NS)
-    {
-        walkOk = false;
-        return 0;
-    }
-    if (type == FTW_SL || type == FTW_SLN)
-        return 0; // links are removed, never followed or changed
-    if (!ClearImmutableFlag(path, *info))
-        walkOk = false;
-    if (chmod(path, 0777) != 0)
-        walkOk = false;
-    return 0;
+    return name[0] == '.' && (name[1] == '\0' || (name[1] == '.' && name[2] == '\0'));
 }
 
-constexpr int kOpenDescriptors = 32;
+// Opens up one entry; false when it could not be made writable. Links are
+// removed, never followed or changed.
+bool MakeEntryWritable(const char* path, const struct stat& info)
+{
+    if (S_ISLNK(info.st_mode))
+        return true;
+    const bool flagCleared = ClearImmutableFlag(path, info);
+    return chmod(path, 0777) == 0 && flagCleared;
+}
+
+// The names in a folder, "." and ".." left out; false when it cannot be read.
+bool ListFolder(const std::string& folder, std::vector<std::string>& names)
+{
+    posix::UniqueDir dir(folder.c_str());
+    if (!dir)
+        return false;
+    while (const dirent* entry = dir.Next())
+        if (!IsDotOrDotDot(entry->d_name))
+            names.emplace_back(entry->d_name);
+    return true;
+}
 } // namespace
 
 bool MakeFolderWritable(const char* path)
 {
     if (!IsExistingPath(path))
         return false;
-    walkOk = true;
-    // Pre-order, so a folder is opened up before its entries are visited.
-    if (nftw(path, MakeEntryWritable, kOpenDescriptors, FTW_PHYS) != 0)
-        return false;
-    return walkOk;
+    bool ok = true;
+    // A folder is opened up before it is read, so that one nobody could
+    // read (mode 0) has its entries visited too. Folders still to visit are
+    // kept by name: one is open at a time, however deep the tree.
+    std::vector<std::string> pending{path};
+    while (!pending.empty())
+    {
+        const std::string entry = std::move(pending.back());
+        pending.pop_back();
+        struct stat info;
+        if (lstat(entry.c_str(), &info) != 0)
+        {
+            ok = false;
+            continue;
+        }
+        if (!MakeEntryWritable(entry.c_str(), info))
+            ok = false;
+        if (!S_ISDIR(info.st_mode))
+            continue;
+        std::vector<std::string> names;
+        if (!ListFolder(entry, names))
+        {
+            ok = false;
+            continue;
+        }
+        for (const std::string& name : names)
+            pending.push_back(entry + "/" + name);
+    }
+    return ok;
 }
 
 void DeleteFolderChildren(const char* folder)

@@ -9,6 +9,7 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
+#include <string>
 
 #include "posix/CLocale.h"
 #include "EPStoPS.h"
@@ -16,6 +17,7 @@
 #include "EngineMessages.h"
 #include "FailureRecord.h"
 #include "LineReader.h"
+#include "LocaleDecimalPoint.h"
 #include "posix/OutsideText.h"
 
 namespace
@@ -89,6 +91,20 @@ bool ReadNumber(const char*& next, double& value)
     return true;
 }
 
+// The box line as numbers are read from it: under a locale whose decimal
+// point is not ".", that point is taken as "." too, since such a locale's
+// users and their programs write the box with it ("0 0 612,5 792").
+std::string WithFullStops(const char* line)
+{
+    std::string text = line;
+    const std::string point = CurrentLocaleDecimalPoint();
+    if (point.empty() || LocaleUsesFullStop(point))
+        return text;
+    for (size_t at = text.find(point); at != std::string::npos; at = text.find(point, at + 1))
+        text.replace(at, point.size(), ".");
+    return text;
+}
+
 // Parses the four numbers after a bounding-box keyword of keywordLength
 // characters; false when there are fewer. Only the first 255 characters of
 // the line count; they are kept in copy.
@@ -97,10 +113,11 @@ bool ParseBox(const char* line, size_t keywordLength, double box[4], char (&copy
     const size_t length = std::min(std::strlen(line), sizeof copy - 1);
     std::memcpy(copy, line, length);
     copy[length] = '\0';
-    // Numbers in EPS files always use "."; parse them in the C locale.
+    const std::string numbers = WithFullStops(copy);
+    // Parsed in the C locale, which reads "." whatever the process's locale.
     posix::CLocaleScope cLocale;
     double values[4];
-    const char* next = copy + keywordLength;
+    const char* next = numbers.c_str() + keywordLength;
     for (double& value : values)
         if (!ReadNumber(next, value))
             return false;

@@ -11,7 +11,8 @@ double OriginShift(double boxValue)
     return boxValue == 0 ? 0.0 : -boxValue;
 }
 
-// Scaling by a side of zero length is undefined; leave that side unscaled.
+// Scaling by a side of zero length is undefined; leave that side unscaled
+// (the plain quotient would print "inf" or "nan", which no printer reads).
 double Ratio(double target, double side)
 {
     return side != 0 ? target / side : 1.0;

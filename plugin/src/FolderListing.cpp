@@ -6,8 +6,10 @@
 #include <sys/stat.h>
 
 #include <algorithm>
+#include <map>
 #include <cstring>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include <wx/strconv.h>
@@ -18,6 +20,9 @@ namespace folder_listing
 {
 namespace
 {
+// Two readings of a folder count its PPML files twice: as many as matter.
+constexpr int kMostReadings = 2;
+
 bool IsDotOrDotDot(const char* name)
 {
     return name[0] == '.' && (name[1] == '\0' || (name[1] == '.' && name[2] == '\0'));
@@ -96,6 +101,11 @@ void ForEachFile(const wxString& folder,
 NameCounts CountPpmlNames(const wxString& folder)
 {
     NameCounts counts;
+    // How often each folder (device, inode) has been read. A folder reached
+    // through links is read again, as the toolkit's listing does; a third
+    // reading cannot change whether there is exactly one PPML file, so none
+    // is made, which also ends a walk round a loop of links.
+    std::map<std::pair<dev_t, ino_t>, int> readings;
     // Folders still to read; one open at a time, however deep the tree.
     std::vector<std::string> pending{std::string(folder.fn_str())};
     while (!pending.empty())
@@ -103,13 +113,15 @@ NameCounts CountPpmlNames(const wxString& folder)
         const std::string path = std::move(pending.back());
         pending.pop_back();
         posix::UniqueDir dir(path.c_str());
-        if (!dir)
+        struct stat status;
+        if (!dir || fstat(dirfd(dir.Get()), &status) != 0 ||
+            ++readings[{status.st_dev, status.st_ino}] > kMostReadings)
             continue;
         while (const dirent* entry = dir.Next())
         {
             if (IsDotOrDotDot(entry->d_name))
                 continue;
-            if (IsDirectory(dir.Get(), entry, false))
+            if (IsDirectory(dir.Get(), entry, true))
             {
                 pending.push_back(path + "/" + entry->d_name);
                 continue;

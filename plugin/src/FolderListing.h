@@ -23,7 +23,10 @@ struct NameCounts
 };
 
 // Counts the non-directory names below folder, at any depth and hidden ones
-// included, that end in ".ppml" or ".PPML". Links are counted by their own
-// name and never followed; folders that cannot be read are passed over.
+// included, that end in ".ppml" or ".PPML", as wxDir lists them: a link to a
+// folder is searched like the folder (its files counted again when the
+// folder is also reached another way), any other link counts by its own
+// name. A folder is read at most twice, so loops of links end; counts from
+// 2 up all mean "several". Folders that cannot be read are passed over.
 NameCounts CountPpmlNames(const wxString& folder);
 } // namespace folder_listing

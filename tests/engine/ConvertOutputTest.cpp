@@ -27,7 +27,7 @@ std::string MaskCreationDate(const std::string& output)
 
 // Converts an EPS filling box; checks that the input stays untouched, that
 // the EPS bytes are copied unchanged and that everything else ends its lines
-// with CR LF and never prints "-0". Returns the job's bytes.
+// with CR LF and never prints "-0", "inf" or "nan". Returns the job's bytes.
 std::string Convert(const testkit::ScratchDir& scratch, const std::string& name,
                     const std::string& box, const std::string& options)
 {
@@ -55,6 +55,8 @@ std::string Convert(const testkit::ScratchDir& scratch, const std::string& name,
         EXPECT_FALSE(wrapper[i] == '\r' && wrapper[i + 1] != '\n') << "bare CR at " << i;
     }
     EXPECT_EQ(std::regex_search(wrapper, std::regex("[ \\[]-0[ \r\\]]")), false) << "-0 printed";
+    EXPECT_EQ(std::regex_search(wrapper, std::regex("[ \\[-](inf|nan)[ \r\\]]")), false)
+        << "a number no printer reads";
     return job;
 }
 } // namespace

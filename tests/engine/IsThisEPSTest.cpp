@@ -28,7 +28,16 @@ int OpenDescriptorCount()
     return count;
 }
 
-void RunTable()
+// A table field that differs by locale is "IN C ; UNDER A DECIMAL COMMA".
+std::string ForLocale(const std::string& field, bool decimalComma)
+{
+    const size_t split = field.find(" ; ");
+    if (split == std::string::npos)
+        return field;
+    return decimalComma ? field.substr(split + 3) : field.substr(0, split);
+}
+
+void RunTable(bool decimalComma)
 {
     testkit::ScratchDir scratch("hf-detect");
     for (const auto& c : testkit::Cases("engine/detect.txt", 7, 41))
@@ -51,7 +60,7 @@ void RunTable()
         posix::SetAllocationFailuresForTesting(0, 0);
         const std::string messages = capture.Text();
 
-        EXPECT_EQ(std::to_string(result), c[3]);
+        EXPECT_EQ(std::to_string(result), ForLocale(c[3], decimalComma));
         EXPECT_EQ(messages, c[6] == "-" ? "" : Unescape(c[6]));
         if (result == 1)
         {
@@ -59,7 +68,7 @@ void RunTable()
             EXPECT_NE(info.epsFile, nullptr);
             EXPECT_EQ(Num(info.boundingBox[0]) + " " + Num(info.boundingBox[1]) + " " +
                           Num(info.boundingBox[2]) + " " + Num(info.boundingBox[3]),
-                      c[4]);
+                      ForLocale(c[4], decimalComma));
             const std::string section =
                 std::to_string(info.psOffset) + " " + std::to_string(info.psLength);
             EXPECT_TRUE(c[5] == "-" || c[5] == section) << section;
@@ -72,13 +81,13 @@ void RunTable()
 
 TEST(Detect, TableOfFiles)
 {
-    RunTable();
+    RunTable(false);
 }
 
 TEST(Detect, TableOfFilesUnderADecimalCommaLocale)
 {
     TESTKIT_USE_LOCALE(german, "de_DE.UTF-8");
-    RunTable();
+    RunTable(true);
 }
 
 TEST(Detect, DocumentNameIsTheLastPathPartWithItsSlash)

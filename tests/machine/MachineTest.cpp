@@ -2,6 +2,8 @@
 // list of hot folders, each test with its own scratch warehouse.
 #include <gtest/gtest.h>
 
+#include <cstdio>
+
 #include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -161,29 +163,69 @@ TEST_F(WarehouseTest, PathsOfTheTable)
     }
 }
 
-TEST_F(WarehouseTest, SharedDirectoriesAndTheRunServiceMarkerAreForEveryUser)
+namespace
 {
+// The steps of one case of shared-folders.txt under the scratch folder
+// scratch; the modes of the paths asked for, spelt as the table spells them.
+std::string SharedFolderModes(const std::string& scratch, const std::string& steps,
+                              const std::vector<std::string>& paths)
+{
+    ::umask(077);
+    wxSetEnv("HOTFOLDER_WAREHOUSE_ROOT", Wx(scratch));
+    for (const std::string& step : testkit::Split(steps, "; "))
     {
-        ScopedUmask restrictive;
-        PathResolver::GetPreferencesPath();
-        EXPECT_TRUE(PathResolver::CreateRunServiceFile());
+        const std::vector<std::string> words = testkit::Split(step, " ");
+        if (words[0] == "root")
+            wxSetEnv("HOTFOLDER_WAREHOUSE_ROOT", Wx(scratch + "/" + words[1]));
+        else if (words[0] == "mkdir")
+        {
+            const std::string made = scratch + "/" + words[1];
+            ::mkdir(made.c_str(), 0700);
+            ::chmod(made.c_str(), static_cast<mode_t>(std::stoi(words[2], nullptr, 8)));
+        }
+        else if (words[0] == "marker")
+            PathResolver::CreateRunServiceFile();
+        else
+            Resolve(words[0], "");
     }
-    for (const char* made : {"", "/Preference", "/Service"})
-        EXPECT_EQ(ModeOf(Warehouse() + made), 0777u) << made;
+    std::string modes;
+    for (const std::string& path : paths)
+    {
+        const unsigned mode = ModeOf(scratch + "/" + path);
+        char octal[16];
+        std::snprintf(octal, sizeof octal, "%o", mode);
+        modes += (modes.empty() ? "" : "; ") + path + " " + (mode == 0xFFFFu ? "none" : octal);
+    }
+    return modes;
+}
+} // namespace
+
+TEST_F(WarehouseTest, SharedFoldersAreForEveryUserAndOnlyThey)
+{
+    for (const testkit::CaseFields& c : testkit::Cases("machine/shared-folders.txt", 3, 7))
+    {
+        SCOPED_TRACE(c[0]);
+        testkit::ScratchDir scratch("hf-shared");
+        ASSERT_TRUE(testkit::HandOver(scratch.Path()));
+        std::vector<std::string> paths;
+        for (const std::string& entry : testkit::Split(c[2], "; "))
+            paths.push_back(entry.substr(0, entry.rfind(' ')));
+        EXPECT_EQ(
+            testkit::AsUnprivileged([&] { return SharedFolderModes(scratch.Path(), c[1], paths); }),
+            c[2]);
+    }
+}
+
+TEST_F(WarehouseTest, TheRunServiceMarkerIsMadeOnceAndRemoved)
+{
+    EXPECT_TRUE(PathResolver::CreateRunServiceFile());
     const std::string marker = Warehouse() + "/Service/RunService";
-    EXPECT_EQ(ModeOf(marker), 0666u);
     EXPECT_EQ(testkit::ReadFile(marker), "");
     testkit::WriteFile(marker, "service state");
     EXPECT_FALSE(PathResolver::CreateRunServiceFile()); // an existing marker is left alone
     EXPECT_EQ(testkit::ReadFile(marker), "service state");
     EXPECT_TRUE(PathResolver::DeleteRunServiceFile());
     EXPECT_FALSE(PathResolver::DeleteRunServiceFile());
-    // Folders that exist already keep their mode.
-    ASSERT_EQ(chmod(Warehouse().c_str(), 0750), 0);
-    ASSERT_EQ(rmdir((Warehouse() + "/Preference").c_str()), 0);
-    PathResolver::GetPreferencesPath();
-    EXPECT_EQ(ModeOf(Warehouse()), 0750u);
-    EXPECT_EQ(ModeOf(Warehouse() + "/Preference"), 0777u);
 }
 
 TEST(PreferenceModel, DefaultsAndEffectiveUnit)

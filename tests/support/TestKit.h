@@ -70,9 +70,11 @@ public:
 private:
     static int RemoveEntry(const char* path, const struct stat*, int type, struct FTW*)
     {
-        if (type != FTW_SL && type != FTW_SLN)
-            chmod(path, 0700);
-        if (type == FTW_DP)
+        const bool opened = type != FTW_SL && type != FTW_SLN && chmod(path, 0700) == 0;
+        // A folder the walk could not read is read now that it is open.
+        if (type == FTW_DNR && opened && access(path, R_OK | X_OK) == 0)
+            nftw(path, RemoveEntry, 16, FTW_DEPTH | FTW_PHYS);
+        else if (type == FTW_DP)
             rmdir(path);
         else
             unlink(path);
