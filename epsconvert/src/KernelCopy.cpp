@@ -54,8 +54,9 @@ bool Drain(const Pipe& pipe, int outFd, size_t count)
 
 // Splices the range through a pipe. Each chunk ends the output on a chunk
 // boundary: the header before the body leaves the output at an odd offset,
-// and whole-page writes there cost the kernel about half as much as
-// copy_file_range's page-by-page splitting (bench_engine has the figures).
+// where one copy_file_range of the whole range took about 1.4 times as
+// long as cat copying the same bytes from offset 0; aligned chunks through
+// the pipe match cat (bench_engine measures every way side by side).
 bool SpliceRange(int inFd, off_t from, int outFd, off_t outAt, unsigned long length)
 {
     const Pipe pipe;
