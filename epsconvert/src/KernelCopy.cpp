@@ -62,6 +62,9 @@ bool SpliceRange(int inFd, off_t from, int outFd, off_t outAt, unsigned long len
     const Pipe pipe;
     if (!pipe.Ok())
         return false;
+    // Measured a little faster on a cached file too; only this descriptor's
+    // read-ahead changes.
+    posix_fadvise(inFd, from, static_cast<off_t>(length), POSIX_FADV_SEQUENTIAL);
     // A smaller pipe (the limit or the user's pipe quota reached) still works.
     fcntl(pipe.WriteEnd(), F_SETPIPE_SZ, kPipeBytes);
     const int pipeBytes = fcntl(pipe.WriteEnd(), F_GETPIPE_SZ);
