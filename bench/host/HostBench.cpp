@@ -102,8 +102,8 @@ int main(int argc, char** argv)
     std::sort(results.begin(), results.end(),
               [](const Figures& a, const Figures& b) { return a.total < b.total; });
     const Figures& median = results[results.size() / 2];
-    std::printf("median: %.1f jobs/s, %.1f%% of the time outside Process (target < 33.3%%): %s\n",
-                median.jobs / median.total, median.share,
-                median.share < 100.0 / 3 ? "met" : "NOT met");
+    std::printf("median: %.1f jobs/s, %.1f%% of the time outside Process\n",
+                median.jobs / median.total, median.share);
+    std::printf("ratio outside_process %.3f (target < 0.333)\n", median.share / 100);
     return 0;
 }

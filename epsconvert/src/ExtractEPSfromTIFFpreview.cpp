@@ -2,55 +2,13 @@
 // binary (leaving its preview behind) or the whole of a plain EPS file.
 #include <cstdio>
 
-#include <sys/stat.h>
-#include <unistd.h>
-
 #include "EPStoPS.h"
 #include "EngineAlloc.h"
 #include "EngineMessages.h"
+#include "KernelCopy.h"
 
 namespace
 {
-// When the whole range is present and both ends are regular files, the
-// kernel copies it without passing the bytes through user space. Anything
-// else (a truncated file, a pipe, a file system that refuses) goes through
-// the buffered loop, which also owns every message.
-bool CopyInKernel(FILE* in, FILE* out, long offset, unsigned long length)
-{
-    const int inFd = fileno(in);
-    const int outFd = fileno(out);
-    struct stat inStat, outStat;
-    if (inFd < 0 || outFd < 0 || fstat(inFd, &inStat) != 0 || fstat(outFd, &outStat) != 0 ||
-        !S_ISREG(inStat.st_mode) || !S_ISREG(outStat.st_mode) || offset < 0 ||
-        static_cast<unsigned long long>(inStat.st_size) <
-            static_cast<unsigned long long>(offset) + length)
-        return false;
-    if (fflush(out) != 0)
-        return false;
-    const off_t outStart = lseek(outFd, 0, SEEK_CUR);
-    off64_t from = offset;
-    unsigned long left = length;
-    while (left > 0)
-    {
-        const ssize_t copied = copy_file_range(inFd, &from, outFd, nullptr, left, 0);
-        if (copied <= 0)
-            break;
-        left -= static_cast<unsigned long>(copied);
-    }
-    if (left != 0)
-    {
-        // Undo a partial kernel copy so the loop starts from a clean state.
-        if (outStart < 0 || ftruncate(outFd, outStart) != 0 || lseek(outFd, outStart, SEEK_SET) < 0)
-            return false;
-        fseek(out, outStart, SEEK_SET);
-        return false;
-    }
-    // Leave both streams where the loop would have left them.
-    fseek(out, 0, SEEK_END);
-    fseek(in, offset + static_cast<long>(length), SEEK_SET);
-    return true;
-}
-
 void ReportShortRead(FILE* in, unsigned long bytesLeft)
 {
     if (ferror(in))
@@ -79,7 +37,9 @@ void ExtractEPSfromTIFFpreview(FILE* in, FILE* out, long offset, long length)
     }
 
     unsigned long bytesLeft = static_cast<unsigned long>(length);
-    if (bytesLeft > bufferSize && CopyInKernel(in, out, offset, bytesLeft))
+    // Large ranges between regular files are copied inside the kernel; the
+    // loop below is the fallback and owns every message.
+    if (bytesLeft > bufferSize && CopyRangeInKernel(in, out, offset, bytesLeft))
         bytesLeft = 0;
     while (bytesLeft > 0)
     {

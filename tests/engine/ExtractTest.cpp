@@ -1,5 +1,8 @@
 // Copying a byte range over the table tests/data/engine/extract.txt, and
 // the read and write failures.
+#include <sys/resource.h>
+
+#include <csignal>
 #include <sstream>
 #include <string>
 
@@ -31,6 +34,32 @@ std::string Copy(FILE* in, FILE* out, long offset, long length)
     fclose(out);
     return messages;
 }
+
+// Lowers the file size limit for one scope; a write past it fails with
+// EFBIG instead of killing the process.
+class FileSizeLimit
+{
+public:
+    explicit FileSizeLimit(rlim_t bytes)
+    {
+        getrlimit(RLIMIT_FSIZE, &saved_);
+        savedSignal_ = signal(SIGXFSZ, SIG_IGN);
+        struct rlimit lowered = saved_;
+        lowered.rlim_cur = bytes;
+        setrlimit(RLIMIT_FSIZE, &lowered);
+    }
+    ~FileSizeLimit()
+    {
+        setrlimit(RLIMIT_FSIZE, &saved_);
+        signal(SIGXFSZ, savedSignal_);
+    }
+    FileSizeLimit(const FileSizeLimit&) = delete;
+    FileSizeLimit& operator=(const FileSizeLimit&) = delete;
+
+private:
+    struct rlimit saved_;
+    void (*savedSignal_)(int);
+};
 } // namespace
 
 TEST(Extract, TableOfRanges)
@@ -67,4 +96,27 @@ TEST(Extract, WriteAndReadFailuresAreReported)
     // A write-only stream cannot be read from: fread sets the error flag.
     EXPECT_EQ(Copy(fopen(in.c_str(), "ab"), fopen(scratch.File("out.bin").c_str(), "wb"), 0, 100),
               "Error from fread in ExtractEPSfromTIFFpreview\n");
+}
+
+// The kernel copy stops at the limit half-way; the buffered copy that takes
+// over starts again right behind what was written before and reports its
+// own failed write. The output holds the right bytes up to the limit.
+TEST(Extract, WriteFailingHalfWayThroughTheKernelCopyIsReported)
+{
+    testkit::ScratchDir scratch("hf-extract");
+    const std::string in = scratch.File("in.bin"), out = scratch.File("out.bin");
+    const std::string input = Pattern(3000000);
+    testkit::WriteFile(in, input);
+    const std::string header = "header written before the copy\n";
+    const rlim_t limit = 2500000;
+    std::string messages;
+    {
+        const FileSizeLimit lowered(limit);
+        FILE* output = fopen(out.c_str(), "wb");
+        ASSERT_NE(output, nullptr);
+        fputs(header.c_str(), output);
+        messages = Copy(fopen(in.c_str(), "rb"), output, 0, 3000000);
+    }
+    EXPECT_EQ(messages, "Error from fwrite in ExtractEPSfromTIFFpreview\n");
+    EXPECT_EQ(testkit::ReadFile(out), header + input.substr(0, limit - header.size()));
 }
