@@ -51,8 +51,7 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 
     static const std::string directory = fuzzsupport::ScratchDirectory() + "/journal";
     static const std::string again = fuzzsupport::ScratchDirectory() + "/rewritten";
-    static const bool made =
-        mkdir(directory.c_str(), 0700) == 0 && mkdir(again.c_str(), 0700) == 0;
+    static const bool made = mkdir(directory.c_str(), 0700) == 0 && mkdir(again.c_str(), 0700) == 0;
     FUZZ_REQUIRE(made);
     fuzzsupport::WriteScratchFile(directory + "/" + FolderJournal::kFileName, data, size);
     const wxString where = wxString::FromUTF8(directory);
