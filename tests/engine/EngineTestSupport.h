@@ -70,17 +70,17 @@ inline std::string DosEpsHeader(uint32_t offset, uint32_t length)
 // A file column of the engine's tables as bytes: text with the escapes of
 // Unescape, {dos OFFSET LENGTH} a DOS EPS binary header, {N*TEXT} TEXT N
 // times, {pad N} blanks up to byte N.
-inline std::string FileBytes(const std::string& spec)
+inline std::string FileBytes(const std::string& description)
 {
     std::string bytes;
-    for (size_t at = 0; at < spec.size();)
+    for (size_t at = 0; at < description.size();)
     {
-        const size_t open = spec.find('{', at);
-        bytes += Unescape(spec.substr(at, open - at));
+        const size_t open = description.find('{', at);
+        bytes += Unescape(description.substr(at, open - at));
         if (open == std::string::npos)
             break;
-        const size_t close = spec.find('}', open);
-        const std::string inner = spec.substr(open + 1, close - open - 1);
+        const size_t close = description.find('}', open);
+        const std::string inner = description.substr(open + 1, close - open - 1);
         std::istringstream words(inner);
         std::string word;
         words >> word;

@@ -60,9 +60,9 @@ class HostBrokenInput : public HostTest
 {
 protected:
     // The bytes a file column describes, before its "; mode" part.
-    std::string Make(const std::string& spec)
+    std::string Make(const std::string& description)
     {
-        std::vector<std::string> parts = testkit::Split(spec, "; ");
+        std::vector<std::string> parts = testkit::Split(description, "; ");
         const std::string& first = parts[0];
         const size_t blank = first.find(' ');
         const std::string kind = first.substr(0, blank);
