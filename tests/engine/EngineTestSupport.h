@@ -2,6 +2,7 @@
 // What the engine tests share besides the test kit: EPS files written on the
 // fly, conversion records spelt as words, and input fingerprints.
 #include <sys/stat.h>
+#include <unistd.h>
 
 #include <cstring>
 #include <locale>
@@ -106,6 +107,20 @@ inline std::string FileBytes(const std::string& description)
         at = close + 1;
     }
     return bytes;
+}
+
+// The input a file column names: "@folder" the scratch folder itself,
+// "@missing" a file that is not there, else in.eps written anew with the
+// column's bytes. Empty when the bytes could not be written.
+inline std::string TableInput(const testkit::ScratchDir& scratch, const std::string& column)
+{
+    if (column == "@folder")
+        return scratch.Path();
+    if (column == "@missing")
+        return scratch.File("missing.eps");
+    const std::string input = scratch.File("in.eps");
+    unlink(input.c_str());
+    return testkit::WriteFile(input, FileBytes(column)) ? input : std::string();
 }
 
 // A conversion record from words separated by "; ": "page W H", "area LLX

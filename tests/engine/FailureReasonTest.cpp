@@ -57,14 +57,8 @@ TEST(FailureReason, TableOfFiles)
     for (const auto& c : testkit::Cases("engine/reasons.txt", 7, 40))
     {
         SCOPED_TRACE(c[0]);
-        std::string input = scratch.File("in.eps");
-        unlink(input.c_str());
-        if (c[1] == "@folder")
-            input = scratch.Path();
-        else if (c[1] == "@missing")
-            input = scratch.File("missing.eps");
-        else
-            ASSERT_TRUE(testkit::WriteFile(input, FileBytes(c[1])));
+        const std::string input = TableInput(scratch, c[1]);
+        ASSERT_FALSE(input.empty());
         int skip = 0, fail = 0;
         std::istringstream(c[2]) >> skip >> fail;
         const std::string output = scratch.File("out.ps");

@@ -43,13 +43,8 @@ void RunTable(bool decimalComma)
     for (const auto& c : testkit::Cases("engine/detect.txt", 7, 41))
     {
         SCOPED_TRACE(c[0]);
-        std::string path = scratch.File("in.eps");
-        if (c[1] == "@folder")
-            path = scratch.Path();
-        else if (c[1] == "@missing")
-            path = scratch.File("missing.eps");
-        else
-            ASSERT_TRUE(testkit::WriteFile(path, FileBytes(c[1])));
+        const std::string path = TableInput(scratch, c[1]);
+        ASSERT_FALSE(path.empty());
         int skip = 0, fail = 0;
         std::istringstream(c[2]) >> skip >> fail;
 
