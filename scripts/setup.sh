@@ -12,7 +12,7 @@ packages=(
   clang libclang-rt-14-dev
   libcups2-dev cups-daemon cups-client cups-core-drivers cups-ppdc
   printer-driver-postscript-hp cups-filters dpkg-dev
-  systemd
+  systemd desktop-file-utils
 )
 
 missing=()
