@@ -1,5 +1,7 @@
 #include "KernelCopy.h"
 
+#include "BodyAlignment.h"
+
 #include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -83,6 +85,23 @@ bool SpliceRange(int inFd, off_t from, int outFd, off_t outAt, unsigned long len
     }
     return true;
 }
+// One copy inside the kernel, for a range whose output offset matches its
+// input offset modulo the body alignment (see BodyAlignment.h): the page
+// cache then moves whole folios, as for a plain copy of the file. False
+// when the file system cannot (the caller then splices what is left).
+bool CopyCongruentRange(int inFd, loff_t& inAt, int outFd, unsigned long& length)
+{
+    while (length > 0)
+    {
+        const ssize_t copied = copy_file_range(inFd, &inAt, outFd, nullptr, length, 0);
+        if (copied < 0 && errno == EINTR)
+            continue;
+        if (copied <= 0)
+            return false;
+        length -= static_cast<unsigned long>(copied);
+    }
+    return true;
+}
 } // namespace
 
 bool CopyRangeInKernel(FILE* in, FILE* out, long offset, unsigned long length)
@@ -100,7 +119,11 @@ bool CopyRangeInKernel(FILE* in, FILE* out, long offset, unsigned long length)
     const off_t outStart = lseek(outFd, 0, SEEK_CUR);
     if (outStart < 0)
         return false;
-    if (!SpliceRange(inFd, offset, outFd, outStart, length))
+    loff_t inAt = offset;
+    unsigned long left = length;
+    const bool congruent = (outStart - offset) % static_cast<off_t>(kBodyAlignment) == 0;
+    if (!(congruent && CopyCongruentRange(inFd, inAt, outFd, left)) &&
+        !SpliceRange(inFd, inAt, outFd, outStart + (inAt - offset), left))
     {
         // Undo a partial copy so the buffered copy starts from a clean state.
         if (ftruncate(outFd, outStart) != 0 || lseek(outFd, outStart, SEEK_SET) < 0)
