@@ -2,6 +2,8 @@
 // waiting file, nothing left behind when they fail.
 #include <sys/stat.h>
 
+#include <wx/filename.h>
+
 #include "CoreTestSupport.h"
 #include "core/DropCopy.h"
 #include "folder/FolderWatcher.h"
@@ -56,7 +58,7 @@ TEST_F(DropCopy, CopiesWholeUnderAFreeNameOrLeavesNothing)
             chmod(source.c_str(), 0);
         const std::vector<std::string> before = Entries(target);
 
-        const auto copy = [&]
+        const auto copy = [&]() -> std::string
         {
             wxString copiedAs, error;
             return CopyIntoHotFolder(wxString::FromUTF8(source.c_str()),

@@ -1,5 +1,7 @@
 // Notices over sequences of rescans: each failure, printer failure and
 // printer problem once, nothing for what was there before.
+#include <wx/datetime.h>
+
 #include "CoreTestSupport.h"
 #include "core/NoticeTracker.h"
 #include "service/FailureLog.h"
