@@ -127,6 +127,7 @@ TEST_F(FolderSetup, AddsFoldersAsInitDoesAndListsThemInOrder)
     {
         EXPECT_EQ(rows[i].path.utf8_string(), listed[i].first);
         EXPECT_EQ(rows[i].name.utf8_string(), listed[i].second);
+        EXPECT_EQ(rows[i].status.name.utf8_string(), listed[i].second); // stored, not made up
         EXPECT_EQ(rows[i].status.problem, "");
     }
 
