@@ -41,16 +41,25 @@ bool LoadQueueServer(const std::string& queue, ServerDescription& server, std::s
     return false;
 }
 
-// Stores a file in the folder's container. False after printing the reason.
 bool StoreBeside(const wxString& folder, const char* name, const std::string& bytes,
-                 const wxString& what)
+                 const wxString& what, wxString& error)
 {
     const wxString stored =
         wxFileName(db::PathResolver::GetContainerFolderPath(folder), name).GetFullPath();
     wxString reason;
     if (db::AtomicFile::Write(stored, bytes, &reason))
         return true;
-    PrintError("cannot store the " + what + " in " + stored + ": " + reason);
+    error = "cannot store the " + what + " in " + stored + ": " + reason;
+    return false;
+}
+
+bool StoreBeside(const wxString& folder, const char* name, const std::string& bytes,
+                 const wxString& what)
+{
+    wxString error;
+    if (StoreBeside(folder, name, bytes, what, error))
+        return true;
+    PrintError(error);
     return false;
 }
 
@@ -59,33 +68,49 @@ static wxString BesidePath(const wxString& folder, const char* name)
     return wxFileName(db::PathResolver::GetContainerFolderPath(folder), name).GetFullPath();
 }
 
-bool BindFolderToQueue(const wxString& folder, const std::string& queue)
+bool BindFolderToQueue(const wxString& folder, const std::string& queue, wxString& error)
 {
     ServerDescription server;
     std::string ppdBytes;
-    wxString origin, error;
+    wxString origin;
     if (!LoadQueueServer(queue, server, ppdBytes, origin, error))
-    {
-        PrintError(error);
         return false;
-    }
     if (!StoreBeside(folder, HotFolder::kServerDescriptionName, ToUtf8(server.GetText()),
-                     "server description"))
+                     "server description", error))
         return false;
     // A queue without a PPD leaves no stale one from an earlier queue behind.
     if (ppdBytes.empty())
         unlink(ToUtf8(BesidePath(folder, HotFolder::kServerPpdName)).c_str());
-    else if (!StoreBeside(folder, HotFolder::kServerPpdName, ppdBytes, "printer description"))
+    else if (!StoreBeside(folder, HotFolder::kServerPpdName, ppdBytes, "printer description",
+                          error))
         return false;
     // The queue last: the service reads the folder again when it changes.
-    return StoreBeside(folder, HotFolder::kPrinterQueueName, queue + "\n", "printer queue");
+    return StoreBeside(folder, HotFolder::kPrinterQueueName, queue + "\n", "printer queue", error);
 }
 
-bool UnbindFolder(const wxString& folder)
+bool BindFolderToQueue(const wxString& folder, const std::string& queue)
+{
+    wxString error;
+    if (BindFolderToQueue(folder, queue, error))
+        return true;
+    PrintError(error);
+    return false;
+}
+
+bool UnbindFolder(const wxString& folder, wxString& error)
 {
     const wxString record = BesidePath(folder, HotFolder::kPrinterQueueName);
     if (unlink(ToUtf8(record).c_str()) == 0 || errno == ENOENT)
         return true;
-    PrintError("cannot remove " + record + ": " + FromUtf8(std::strerror(errno)));
+    error = "cannot remove " + record + ": " + FromUtf8(std::strerror(errno));
+    return false;
+}
+
+bool UnbindFolder(const wxString& folder)
+{
+    wxString error;
+    if (UnbindFolder(folder, error))
+        return true;
+    PrintError(error);
     return false;
 }

@@ -13,15 +13,20 @@ class ServerDescription;
 bool LoadQueueServer(const std::string& queue, ServerDescription& server, std::string& bytes,
                      wxString& origin, wxString& error);
 
-// Stores a file in the folder's container, replacing it whole. False after
-// printing the reason.
+// Stores a file in the folder's container, replacing it whole. False with
+// the reason (the second form prints it).
+bool StoreBeside(const wxString& folder, const char* name, const std::string& bytes,
+                 const wxString& what, wxString& error);
 bool StoreBeside(const wxString& folder, const char* name, const std::string& bytes,
                  const wxString& what);
 
 // Binds the folder to the queue: its server description (and PPD) and the
-// queue's name beside Folder.cfg. False after printing the reason.
+// queue's name beside Folder.cfg. False with the reason (the second form
+// prints it).
+bool BindFolderToQueue(const wxString& folder, const std::string& queue, wxString& error);
 bool BindFolderToQueue(const wxString& folder, const std::string& queue);
 
 // The folder prints nowhere any more: its outputs stay in the output folder.
-// False after printing the reason.
+// False with the reason (the second form prints it).
+bool UnbindFolder(const wxString& folder, wxString& error);
 bool UnbindFolder(const wxString& folder);

@@ -37,11 +37,22 @@ bool LoadPpdServer(const std::string& ppd, ServerDescription& server, std::strin
 bool StoreServerBeside(const wxString& folder, const ServerDescription& server,
                        const std::string& ppdBytes)
 {
+    wxString error;
+    if (StoreServerBeside(folder, server, ppdBytes, error))
+        return true;
+    PrintError(error);
+    return false;
+}
+
+bool StoreServerBeside(const wxString& folder, const ServerDescription& server,
+                       const std::string& ppdBytes, wxString& error)
+{
     if (!StoreBeside(folder, HotFolder::kServerDescriptionName, ToUtf8(server.GetText()),
-                     "server description"))
+                     "server description", error))
         return false;
     if (!ppdBytes.empty())
-        return StoreBeside(folder, HotFolder::kServerPpdName, ppdBytes, "printer description");
+        return StoreBeside(folder, HotFolder::kServerPpdName, ppdBytes, "printer description",
+                           error);
     // A PPD from an earlier binding no longer describes the server.
     const wxString stale =
         wxFileName(db::PathResolver::GetContainerFolderPath(folder), HotFolder::kServerPpdName)

@@ -15,6 +15,8 @@ bool LoadPpdServer(const std::string& ppd, ServerDescription& server, std::strin
 
 // Stores the description (and the PPD's bytes, when there are any; else an
 // older PPD goes) beside the folder's Folder.cfg, each replaced whole. False
-// after printing the reason.
+// with the reason (the second form prints it).
+bool StoreServerBeside(const wxString& folder, const ServerDescription& server,
+                       const std::string& ppdBytes, wxString& error);
 bool StoreServerBeside(const wxString& folder, const ServerDescription& server,
                        const std::string& ppdBytes);

@@ -138,6 +138,16 @@ bool HotFolder::SavePreflight(const db::PreflightConfiguration& preflight, wxStr
     return Save(m_filters, preflight, error);
 }
 
+bool HotFolder::SaveName(const wxString& name, wxString& error)
+{
+    const wxString previous = m_setting.GetName();
+    m_setting.SetName(name);
+    if (Save(m_filters, m_preflight, error))
+        return true;
+    m_setting.SetName(previous);
+    return false;
+}
+
 bool HotFolder::Save(const db::FilterConfiguration& filters,
                      const db::PreflightConfiguration& preflight, wxString& error)
 {

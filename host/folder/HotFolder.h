@@ -60,6 +60,11 @@ public:
     // reason when the configuration cannot be written.
     bool FollowMove(wxString& note, wxString& error);
 
+    // The name stored in Folder.cfg ("Setting" name); may be empty.
+    wxString GetName() const { return m_setting.GetName(); }
+    // Rewrites Folder.cfg with this name; everything else as read.
+    bool SaveName(const wxString& name, wxString& error);
+
     // The stored "PreflightSettings" entries.
     const db::PreflightConfiguration& GetPreflight() const { return m_preflight; }
     // Rewrites Folder.cfg with these entries; everything else as read.

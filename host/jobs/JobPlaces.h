@@ -21,7 +21,7 @@ extern const char kFailureLogName[];
 // A delivered output's job ticket is the output's name with this appended.
 extern const char kTicketSuffix[];
 
-enum class JobOutcome
+enum class JobResult
 {
     Done,
     Failed,

@@ -175,6 +175,7 @@ FolderStatus ReadFolderStatus(const wxString& path)
     HotFolder folder;
     if (!folder.Open(path, status.problem))
         return status;
+    status.name = folder.GetName();
     status.server = ServerName(folder);
     const wxXmlNode* filter = nullptr;
     for (const wxXmlNode* child = folder.GetFilterSetting().GetChildren(); child && !filter;

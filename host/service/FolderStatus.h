@@ -14,6 +14,7 @@ struct FolderStatus
 {
     wxString path;
     wxString problem; // why the folder cannot be served; empty when it can
+    wxString name;    // the name stored in Folder.cfg; may be empty
     wxString server;  // the bound server's name; empty when none
     wxString outputType;
     wxString page;

@@ -227,7 +227,7 @@ size_t ServedFolder::TakeBatch(size_t limit, const std::function<bool()>& stop)
         }
         ++run;
         m_report.Begin(i, jobs.size(), jobs[i].jobName);
-        if (m_jobs->Run(jobs[i]) == JobOutcome::OriginalStuck)
+        if (m_jobs->Run(jobs[i]) == JobResult::OriginalStuck)
             for (const wxString& file : jobs[i].files)
                 SetAside(file);
     }

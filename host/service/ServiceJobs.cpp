@@ -158,7 +158,7 @@ void ServiceJobs::RemoveStaged(const wxString& id)
         unlink(Native(StagedPath(id, what)).c_str());
 }
 
-JobOutcome ServiceJobs::Run(const ReadyToProcessJobInfo& job)
+JobResult ServiceJobs::Run(const ReadyToProcessJobInfo& job)
 {
     const wxString id = NewJobId();
     const wxString work = WorkDirectory(id);
@@ -167,7 +167,7 @@ JobOutcome ServiceJobs::Run(const ReadyToProcessJobInfo& job)
         m_report.Error(wxString::Format("%s: cannot make a work directory in %s: %s", job.jobName,
                                         m_places.workFolder, Reason(errno)));
         RemoveTree(work);
-        return JobOutcome::OriginalStuck;
+        return JobResult::OriginalStuck;
     }
     ReadyToProcessJobInfo claimed = job;
     claimed.files.clear();
@@ -192,7 +192,7 @@ JobOutcome ServiceJobs::Run(const ReadyToProcessJobInfo& job)
     if (claimed.files.empty())
     {
         Retire(id);
-        return JobOutcome::Failed;
+        return JobResult::Failed;
     }
     // What was checked in the hot folder may have been swapped for a link
     // since; in the work folder no dropper can swap it again.
@@ -269,7 +269,7 @@ void ServiceJobs::ClearEarlierAttempt(const wxString& id)
     RemoveStaged(id);
 }
 
-JobOutcome ServiceJobs::Continue(const wxString& id, ReadyToProcessJobInfo job)
+JobResult ServiceJobs::Continue(const wxString& id, ReadyToProcessJobInfo job)
 {
     const wxString work = WorkDirectory(id);
     wxString error;
@@ -317,7 +317,7 @@ JobOutcome ServiceJobs::Continue(const wxString& id, ReadyToProcessJobInfo job)
         return Fail(id, job.jobName, "cannot find a free name for " + output.outputName);
     }
     m_staged.push_back(Staged{id, name, job.jobName});
-    return JobOutcome::Done;
+    return JobResult::Done;
 }
 
 void ServiceJobs::Commit()
@@ -397,18 +397,18 @@ bool ServiceJobs::Place(const wxString& id, wxString& name, const wxString& jobN
     return true;
 }
 
-JobOutcome ServiceJobs::Deliver(const wxString& id, const wxString& recordedName,
-                                const wxString& jobName)
+JobResult ServiceJobs::Deliver(const wxString& id, const wxString& recordedName,
+                               const wxString& jobName)
 {
     wxString name = recordedName;
     if (!Place(id, name, jobName))
-        return JobOutcome::Failed;
+        return JobResult::Failed;
     SyncPath(m_places.outputFolder);
     return KeepOriginals(id,
                          jobName + " -> " + wxFileName(m_places.outputFolder, name).GetFullPath());
 }
 
-JobOutcome ServiceJobs::KeepOriginals(const wxString& id, const wxString& result)
+JobResult ServiceJobs::KeepOriginals(const wxString& id, const wxString& result)
 {
     for (const wxString& file : Originals(id))
     {
@@ -418,7 +418,7 @@ JobOutcome ServiceJobs::KeepOriginals(const wxString& id, const wxString& result
         {
             ++m_statistics.failed;
             m_report.Error(result + "; the original stays in the work folder: " + error);
-            return JobOutcome::OriginalStuck;
+            return JobResult::OriginalStuck;
         }
     }
     Retire(id);
@@ -426,17 +426,17 @@ JobOutcome ServiceJobs::KeepOriginals(const wxString& id, const wxString& result
     ++m_statistics.done;
     m_report.Done(result);
     m_journal.CompactIfLarge();
-    return JobOutcome::Done;
+    return JobResult::Done;
 }
 
-JobOutcome ServiceJobs::Fail(const wxString& id, const wxString& jobName, const wxString& reason)
+JobResult ServiceJobs::Fail(const wxString& id, const wxString& jobName, const wxString& reason)
 {
     ++m_statistics.failed;
     AppendFailureLine(m_places.failedFolder, jobName, reason, m_report);
     // Recorded as to be printed, it never was delivered: the printing forgets it.
     if (m_journal.PrintOf(id))
         m_journal.Append({FolderJournal::Dropped(id)});
-    JobOutcome outcome = JobOutcome::Failed;
+    JobResult outcome = JobResult::Failed;
     for (const wxString& file : Originals(id))
     {
         wxString moved, error;
@@ -446,10 +446,10 @@ JobOutcome ServiceJobs::Fail(const wxString& id, const wxString& jobName, const 
         else
         {
             m_report.Failed(jobName, reason, "the original stays in the work folder: " + error);
-            outcome = JobOutcome::OriginalStuck;
+            outcome = JobResult::OriginalStuck;
         }
     }
-    if (outcome == JobOutcome::Failed)
+    if (outcome == JobResult::Failed)
     {
         RemoveStaged(id);
         Retire(id);

@@ -52,7 +52,7 @@ public:
 
     // Claims the job's files and takes them through step 3; a failure ends
     // it at once.
-    JobOutcome Run(const ReadyToProcessJobInfo& job);
+    JobResult Run(const ReadyToProcessJobInfo& job);
     // Delivers every job staged since the last call (steps 4 and 5).
     void Commit();
     // Removes the spare work directories: the folder has nothing more to do.
@@ -62,7 +62,7 @@ public:
 
 private:
     // Steps 2 and 3 in a work directory that holds only the originals.
-    JobOutcome Continue(const wxString& id, ReadyToProcessJobInfo job);
+    JobResult Continue(const wxString& id, ReadyToProcessJobInfo job);
     // What an earlier attempt at the job left beside the originals goes.
     void ClearEarlierAttempt(const wxString& id);
     // Everything in the work directory but its originals folder goes; true
@@ -74,9 +74,9 @@ private:
     };
     // Renames the staged output and ticket; false after failing the job.
     bool Place(const wxString& id, wxString& name, const wxString& jobName);
-    JobOutcome Deliver(const wxString& id, const wxString& recordedName, const wxString& jobName);
-    JobOutcome KeepOriginals(const wxString& id, const wxString& result);
-    JobOutcome Fail(const wxString& id, const wxString& name, const wxString& reason);
+    JobResult Deliver(const wxString& id, const wxString& recordedName, const wxString& jobName);
+    JobResult KeepOriginals(const wxString& id, const wxString& result);
+    JobResult Fail(const wxString& id, const wxString& name, const wxString& reason);
     void RemoveStaged(const wxString& id);
     // A fresh work directory with its empty originals folder, from a spare
     // where one is left.
