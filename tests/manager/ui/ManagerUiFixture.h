@@ -15,6 +15,7 @@
 
 #include "CaseTable.h"
 #include "HostTestSupport.h"
+#include "ui/LiveList.h"
 #include "ui/ManagerFrame.h"
 
 namespace manager_test
@@ -60,8 +61,8 @@ protected:
         if (m_frame)
             m_frame->Destroy();
         m_frame = nullptr;
-        wxTheApp->ProcessPendingEvents(); // a frame goes at the next idle time
-        wxTheApp->DeletePendingObjects();
+        // A frame goes at idle time; its poller and preview worker end with it.
+        PumpUntil([] { return wxTopLevelWindows.empty(); });
     }
     ManagerFrame& Frame()
     {

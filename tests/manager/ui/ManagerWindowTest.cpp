@@ -25,6 +25,7 @@
 #include "ui/ServiceBar.h"
 
 using namespace manager_test;
+using namespace host_test;
 using testkit::Cases;
 
 namespace
@@ -110,7 +111,7 @@ TEST_F(ManagerWindow, ServiceBarFollowsTheService)
         else if (step[0] == "end")
             service.reset();
         else if (step[0] == "marker")
-            WriteFile(db::PathResolver::GetStopAllHFFilePath().utf8_string(), "");
+            WriteFile(db::PathResolver::GetStopAllHFFilePath().GetFullPath().utf8_string(), "");
         else if (step[0] == "click") // a real click where the button is
         {
             wxUIActionSimulator user;
@@ -184,7 +185,9 @@ TEST_F(ManagerWindow, AddsFoldersBoundAsChosenAndStoresThePanelsSettings)
         EXPECT_TRUE(dialog->Accept());
         dialog->Destroy();
         if (c[2] != "-")
+        {
             EXPECT_TRUE(Exists(Container(folder) + "/" + c[2]));
+        }
         const auto shown = Host({"settings", folder, "--show"});
         EXPECT_NE(std::string::npos, shown.out.find(c[4] + "  #")) << shown.out << shown.err;
         ASSERT_TRUE(PumpUntil([&] { return RowOf(folder) >= 0; }));
@@ -205,7 +208,7 @@ TEST_F(ManagerWindow, DroppedFilesBecomeJobsAndAFailedOneCanBeRetried)
     ASSERT_TRUE(JobShown("not-really.eps", "failed")) << service->Err();
 
     // Paused, the retried original waits in the folder where the list shows it.
-    WriteFile(db::PathResolver::GetStopAllHFFilePath().utf8_string(), "");
+    WriteFile(db::PathResolver::GetStopAllHFFilePath().GetFullPath().utf8_string(), "");
     ASSERT_TRUE(PumpUntil([&] { return Frame().Service().State() == ServiceState::Paused; }));
     const auto& jobs = Frame().ShownJobs();
     const auto failed = std::find_if(
