@@ -1,5 +1,7 @@
 #include "ui/LiveList.h"
 
+#include <algorithm>
+
 LiveList::LiveList(wxWindow* parent, const std::vector<wxString>& headings)
     : wxListCtrl(parent, wxID_ANY, wxDefaultPosition, wxDefaultSize, wxLC_REPORT | wxLC_SINGLE_SEL)
 {
@@ -62,12 +64,13 @@ void LiveList::SelectKey(const wxString& key)
 long LiveList::RowAt(const wxPoint& point) const
 {
     // Points come in the list's own coordinates; the generic list tests
-    // them in its rows' window, which lies below the column headings.
-    wxPoint at = point;
+    // them in its rows' window, the child below the column headings.
+    wxPoint rowsOrigin;
     for (const wxWindow* child : GetChildren())
-        if (child->GetClassInfo() &&
-            wxString(child->GetClassInfo()->GetClassName()) == "wxListMainWindow")
-            at -= child->GetPosition();
+        rowsOrigin.y = std::max(rowsOrigin.y, child->GetPosition().y);
+    if (point.y < rowsOrigin.y)
+        return -1;
+    const wxPoint at = point - rowsOrigin;
     int flags = 0;
     const long row = HitTest(at, flags);
     return (flags & wxLIST_HITTEST_ONITEM) ? row : -1;

@@ -94,8 +94,8 @@ wxWindow* ManagerFrame::MakeFolderSide(wxWindow* parent)
                             event.Skip();
                     });
     auto* folderButtons = new wxBoxSizer(wxHORIZONTAL);
-    AddButton(side, folderButtons, _("&Add…"), [this] { AddFolder(); });
-    m_settings = AddButton(side, folderButtons, _("&Settings…"), [this] { EditSelectedFolder(); });
+    AddButton(side, folderButtons, _(L"&Add…"), [this] { AddFolder(); });
+    m_settings = AddButton(side, folderButtons, _(L"&Settings…"), [this] { EditSelectedFolder(); });
     m_remove = AddButton(side, folderButtons, _("&Remove"), [this] { RemoveSelectedFolder(); });
 
     m_jobs = new LiveList(side, JobColumnHeadings());

@@ -18,7 +18,7 @@ PreviewPanel::PreviewPanel(wxWindow* parent, const wxString& modulePath)
                                wxST_ELLIPSIZE_MIDDLE);
     m_canvas = new PreviewCanvas(this);
     m_canvas->ShowMessage(_("Select a job and choose Show output, or try a file."));
-    m_try = new wxButton(this, wxID_ANY, _("&Try a file…"));
+    m_try = new wxButton(this, wxID_ANY, _(L"&Try a file…"));
     m_try->Bind(wxEVT_BUTTON, [this](wxCommandEvent&) { TryFile(); });
     m_try->Disable();
 
@@ -82,7 +82,7 @@ bool PreviewPanel::TryFileNamed(const wxString& eps)
 void PreviewPanel::Render(const wxString& postscript, const wxString& title)
 {
     m_title->SetLabel(title);
-    m_canvas->ShowMessage(_("Rendering…"));
+    m_canvas->ShowMessage(_(L"Rendering…"));
     PreviewOptions options;
     options.imageable = ImageableAreaOf(m_folder);
     wxString ghostscript;

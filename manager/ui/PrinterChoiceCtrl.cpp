@@ -54,13 +54,13 @@ void PrinterChoiceCtrl::ListQueues()
             const wxString name = posix::ShownLine(wxString::FromUTF8(queue.name));
             m_list->Append(queue.makeAndModel.empty()
                                ? name
-                               : name + " — " +
+                               : name + wxString(L" — ") +
                                      posix::ShownLine(wxString::FromUTF8(queue.makeAndModel)));
         }
     else
         m_note->SetLabel(wxString::Format(_("The printers cannot be listed: %s"),
                                           posix::ShownLine(wxString::FromUTF8(error))));
-    m_list->Append(_("A printer description file (PPD)…"));
+    m_list->Append(_(L"A printer description file (PPD)…"));
     m_list->Append(_("No printer: output only"));
 }
 

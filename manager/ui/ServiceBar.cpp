@@ -8,7 +8,7 @@
 ServiceBar::ServiceBar(wxWindow* parent, std::function<void()> changed)
     : wxPanel(parent), m_changed(std::move(changed))
 {
-    m_text = new wxStaticText(this, wxID_ANY, _("Reading the service's state…"));
+    m_text = new wxStaticText(this, wxID_ANY, _(L"Reading the service's state…"));
     m_text->SetFont(m_text->GetFont().Bold());
     m_button = new wxButton(this, wxID_ANY, _("Start ser&vice"));
     m_button->Bind(wxEVT_BUTTON, [this](wxCommandEvent&) { OnAction(); });
