@@ -144,9 +144,11 @@ void WaitBlocking(pid_t pid, int& status)
     }
 }
 // Reads the child's streams until it has ended and they are closed, or
-// until the wall-clock limit kills what is left. False when it had to be
-// killed still running; status is its wait status once it has ended.
-bool Follow(pid_t pid, Stream (&streams)[3], int wallSeconds, int& status)
+// until the wall-clock limit or the stop descriptor kills what is left.
+// False when it had to be killed still running; status is its wait status
+// once it has ended.
+bool Follow(pid_t pid, Stream (&streams)[3], int wallSeconds, int stopFd, int& status,
+            bool& stopped)
 {
     UniqueFd exitSignal(static_cast<int>(syscall(SYS_pidfd_open, pid, 0)));
     const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(wallSeconds);
@@ -159,7 +161,7 @@ bool Follow(pid_t pid, Stream (&streams)[3], int wallSeconds, int& status)
             const pid_t waited = waitpid(pid, &status, WNOHANG);
             exited = waited == pid || (waited < 0 && errno == ECHILD);
         }
-        pollfd wanted[4];
+        pollfd wanted[5];
         nfds_t count = 0;
         for (Stream& stream : streams)
             if (stream.fd)
@@ -174,7 +176,12 @@ bool Follow(pid_t pid, Stream (&streams)[3], int wallSeconds, int& status)
             wanted[count++] = {exitSignal.Get(), POLLIN, 0};
         else if (!exited && count == 0)
             timeout = std::min(timeout, 10); // no process descriptor: look again soon
-        if (left <= 0 || (poll(wanted, count, timeout) < 0 && errno != EINTR))
+        const nfds_t stopAt = count;
+        if (stopFd >= 0)
+            wanted[count++] = {stopFd, POLLIN, 0};
+        const bool failed = left <= 0 || (poll(wanted, count, timeout) < 0 && errno != EINTR);
+        stopped = !failed && stopFd >= 0 && wanted[stopAt].revents != 0;
+        if (failed || stopped)
         {
             // Whatever still runs in the group goes; a child that ended but
             // left its streams to another process keeps its own end.
@@ -259,7 +266,7 @@ ChildRun RunLimitedChild(const std::string& program, const std::vector<std::stri
                         {std::move(errRead), &run.err, limits.outputBytes},
                         {std::move(reportRead), &report, sizeof(StartFailure)}};
     int status = 0;
-    const bool ended = Follow(pid, streams, limits.wallSeconds, status);
+    const bool ended = Follow(pid, streams, limits.wallSeconds, limits.stopFd, status, run.stopped);
     Conclude(report, ended, status, run);
     return run;
 }

@@ -17,6 +17,10 @@ struct ChildLimits
     long cpuSeconds = 60;                // RLIMIT_CPU; 0: no limit
     unsigned long long memoryBytes = 0;  // RLIMIT_AS; 0: no limit
     std::size_t outputBytes = 64 * 1024; // kept of each stream; the rest is read and dropped
+    // A descriptor another thread makes readable (or closes the other end
+    // of) to end the run early: the child and its group are killed then, as
+    // at the time limit, and the run says stopped. -1: none.
+    int stopFd = -1;
 };
 
 struct ChildRun
@@ -31,6 +35,7 @@ struct ChildRun
     };
     End end = End::NotStarted;
     int code = 0;
+    bool stopped = false; // ended through stopFd, not by the time limit
     std::string out, err;
 };
 
