@@ -10,6 +10,6 @@ cmake --preset default -S "$root" -B "$build" >/dev/null
 cmake --build "$build" --target ui_panel_screenshots manager_screenshots hf_catalogues -j2
 for language in en de; do
   xvfb-run -a -s "-screen 0 1280x1024x24" "$build/bin/ui_panel_screenshots" "$root/docs" "$language"
-  xvfb-run -a -s "-screen 0 1280x1024x24" "$build/bin/manager_screenshots" "$root/docs" "$language"
+  xvfb-run -a -s "-screen 0 1920x1080x24" "$build/bin/manager_screenshots" "$root/docs" "$language"
 done
 ls -1 "$root"/docs/settings-panel-*.png "$root"/docs/custom-page-size-*.png "$root"/docs/manager-*.png

@@ -32,6 +32,7 @@ FolderDialog::FolderDialog(wxWindow* parent, const wxString& modulePath, const w
 {
     m_folderPicker = new wxDirPickerCtrl(this, wxID_ANY, folder, _("Choose the hot folder"),
                                          wxDefaultPosition, wxSize(380, -1), wxDIRP_USE_TEXTCTRL);
+    m_folderPicker->SetPath(folder);
     m_folderPicker->Enable(folder.empty()); // a listed folder stays where it is
     m_name = new wxTextCtrl(this, wxID_ANY, name);
     m_name->SetHint(_("the folder's own name when empty"));
@@ -150,6 +151,7 @@ void FolderDialog::RebuildFilterPanel()
         m_panelNote->SetLabel(
             wxString::Format(_("The filter's settings cannot be shown: %s"),
                              posix::ShownLine(m_session ? _("it offers no panel") : error)));
+    m_panelNote->Show(!m_panelNote->GetLabel().empty());
     m_panelHolder->Layout();
     GetSizer()->SetSizeHints(this);
     Layout();

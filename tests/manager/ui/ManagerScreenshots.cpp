@@ -7,6 +7,7 @@
 #include <wx/dcscreen.h>
 #include <wx/image.h>
 #include <wx/stopwatch.h>
+#include <wx/timer.h>
 
 #include <hotfolder/HFTranslations.h>
 
@@ -61,8 +62,9 @@ bool Wait(const std::function<bool()>& condition)
     return true;
 }
 
-// The screen as it is now, cut to the window.
-bool Save(wxWindow* window, const wxString& file)
+// The screen as it is now, cut to each window. The screen is read back in
+// one snapshot: the screen device keeps the first picture it took.
+bool Save(const std::vector<std::pair<wxWindow*, wxString>>& windows)
 {
     for (int i = 0; i < 50; ++i, wxMilliSleep(10))
         wxYield();
@@ -71,7 +73,11 @@ bool Save(wxWindow* window, const wxString& file)
     wxMemoryDC memory(whole);
     memory.Blit(wxPoint(0, 0), screen.GetSize(), &screen, wxPoint(0, 0));
     memory.SelectObject(wxNullBitmap);
-    return whole.GetSubBitmap(window->GetScreenRect()).SaveFile(file, wxBITMAP_TYPE_PNG);
+    bool saved = true;
+    for (const auto& [window, file] : windows)
+        saved =
+            whole.GetSubBitmap(window->GetScreenRect()).SaveFile(file, wxBITMAP_TYPE_PNG) && saved;
+    return saved;
 }
 
 class ScreenshotApp : public wxApp
@@ -101,13 +107,21 @@ public:
             frame->Jobs().SelectKey(frame->Jobs().Keys().front());
             frame->ShowSelectedOutput();
         }
-        m_ok = m_ok && Wait([&] { return frame->Preview().Delivered() > 0; }) &&
-               Save(frame, prefix + suffix);
+        m_ok = m_ok && Wait([&] { return frame->Preview().Delivered() > 0; });
 
         auto* dialog = new FolderDialog(frame, HF_MODULE_PATH, folder, "Posters A4");
-        dialog->Move(0, 0);
-        dialog->Show();
-        m_ok = m_ok && Save(dialog, prefix + "-folder-dialog" + suffix);
+        dialog->Move(frame->GetRect().GetRight() + 10, 0); // beside: nothing stacks them
+        // A dialog is drawn for sure only inside its own modal loop.
+        wxTimer timer;
+        timer.Bind(wxEVT_TIMER,
+                   [&](wxTimerEvent&)
+                   {
+                       m_ok = m_ok && Save({{frame, prefix + suffix},
+                                            {dialog, prefix + "-folder-dialog" + suffix}});
+                       dialog->EndModal(wxID_CANCEL);
+                   });
+        timer.StartOnce(500);
+        dialog->ShowModal();
         dialog->Destroy();
         frame->Destroy();
         return true;
