@@ -48,6 +48,18 @@ void CollectLabels(wxWindow* window, std::set<std::string>& labels)
     for (wxWindow* child : window->GetChildren())
         CollectLabels(child, labels);
 }
+// Gives the window (or the part of it that takes keys) the keyboard focus for real.
+bool GiveFocus(wxWindow& window)
+{
+    window.SetFocus();
+    return PumpUntil(
+        [&]
+        {
+            const wxWindow* focus = wxWindow::FindFocus();
+            return focus && (focus == &window || focus->GetParent() == &window);
+        },
+        5000);
+}
 } // namespace
 
 class ManagerWindow : public ManagerTest
@@ -215,8 +227,8 @@ TEST_F(ManagerWindow, DroppedFilesBecomeJobsAndAFailedOneCanBeRetried)
     WriteFile(db::PathResolver::GetStopAllHFFilePath().GetFullPath().utf8_string(), "");
     ASSERT_TRUE(PumpUntil([&] { return Frame().Service().State() == ServiceState::Paused; }));
     const auto& jobs = Frame().ShownJobs();
-    const auto failed = std::find_if(
-        jobs.begin(), jobs.end(), [](const JobEntry& job) { return job.name == "no-box.eps"; });
+    const auto failed = std::find_if(jobs.begin(), jobs.end(),
+                                     [](const JobEntry& job) { return job.name == "no-box.eps"; });
     ASSERT_NE(jobs.end(), failed);
     EXPECT_TRUE(failed->retryable);
     Frame().Jobs().SelectKey(Frame().Jobs().Keys()[failed - jobs.begin()]);
@@ -270,6 +282,34 @@ TEST_F(ManagerWindow, PreviewShowsTheArtWhereGhostscriptFindsTheMarks)
     // Outside the marks only the imageable area's dashed outline is drawn.
     const wxRect imageable = canvas.PixelsOf(canvas.Page().imageable, size);
     EXPECT_LE(outside, 2 * (imageable.width + imageable.height) + 8);
+
+    // A file tried with the folder's settings shows its page; the folder
+    // gets no new job.
+    const size_t delivered = Frame().Preview().Delivered();
+    const auto outputs = ListDirectory(folder + "/Output"), entries = ListDirectory(folder);
+    ASSERT_TRUE(Frame().Preview().TryFileNamed(kExamples + "/eps/banner-landscape.eps"));
+    ASSERT_TRUE(PumpUntil([&] { return Frame().Preview().Delivered() > delivered; }, 60000));
+    EXPECT_TRUE(canvas.Page().ok) << canvas.Page().reason;
+    EXPECT_FALSE(canvas.Page().marks.IsEmpty());
+    EXPECT_EQ(outputs, ListDirectory(folder + "/Output"));
+    EXPECT_EQ(entries, ListDirectory(folder));
+}
+
+TEST_F(ManagerWindow, DeleteKeyRemovesTheFolderFromTheListButKeepsItsFiles)
+{
+    const std::string folder = MakePostScriptFolder();
+    Select(folder);
+    ASSERT_TRUE(GiveFocus(Frame().Folders()));
+    wxTEST_DIALOG(
+        {
+            wxUIActionSimulator user;
+            user.Char(WXK_DELETE);
+            PumpUntil([&] { return RowOf(folder) < 0; }, 5000);
+        },
+        wxExpectModal<wxMessageDialog>(wxID_YES));
+    EXPECT_TRUE(Rescanned());
+    EXPECT_EQ(-1, RowOf(folder));
+    EXPECT_TRUE(Exists(Container(folder) + "/Folder.cfg"));
 }
 
 TEST_F(ManagerWindow, AMissingOrHangingGhostscriptNeverHoldsTheWindow)
