@@ -70,7 +70,7 @@ FolderDialog::FolderDialog(wxWindow* parent, const wxString& modulePath, const w
         if (!m_stored->Open(folder, error))
         {
             m_stored.reset();
-            m_panelNote->SetLabel(posix::ShownLine(error));
+            m_openError = posix::ShownLine(error);
         }
     }
     Bind(
@@ -135,7 +135,7 @@ void FolderDialog::RebuildFilterPanel()
     const std::unique_ptr<wxXmlNode> setting = CurrentFilterSetting();
     DropFilterPanel();
     wxString server, error;
-    m_panelNote->SetLabel(wxString());
+    m_panelNote->SetLabel(m_openError);
     if (!LoadPrinterServer(m_printer->Value(), server, error))
     {
         m_panelNote->SetLabel(wxString::Format(_("The printer's description cannot be read: %s"),

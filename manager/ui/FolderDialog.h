@@ -50,6 +50,7 @@ private:
     wxString m_storedName;
     PrinterChoice m_storedPrinter;
     std::unique_ptr<HotFolder> m_stored;
+    wxString m_openError; // why the folder's stored settings cannot be read
     wxDirPickerCtrl* m_folderPicker = nullptr;
     wxTextCtrl* m_name = nullptr;
     PrinterChoiceCtrl* m_printer = nullptr;

@@ -222,6 +222,10 @@ TEST_F(ManagerWindow, DroppedFilesBecomeJobsAndAFailedOneCanBeRetried)
     WriteFile(scratch + "/no-box.eps", "%!PS-Adobe-3.0 EPSF-3.0\n%%BoundingBox: 0 0 nan 792\n");
     ASSERT_TRUE(Drop(folder, {scratch + "/no-box.eps"}));
     ASSERT_TRUE(JobShown("no-box.eps", "failed")) << service->Err();
+    // One desktop notice for the failure, however often the window rescans.
+    EXPECT_TRUE(Rescanned());
+    ASSERT_EQ(1u, notices.size());
+    EXPECT_NE(wxNOT_FOUND, notices[0].title.Find("hot"));
 
     // Paused, the retried original waits in the folder where the list shows it.
     WriteFile(db::PathResolver::GetStopAllHFFilePath().GetFullPath().utf8_string(), "");
