@@ -1,5 +1,8 @@
 #include "core/FolderSetup.h"
 
+#include <cerrno>
+#include <cstring>
+#include <unistd.h>
 #include <vector>
 
 #include <wx/filename.h>
@@ -13,6 +16,7 @@
 #include "db/PathResolver.h"
 #include "folder/HotFolder.h"
 #include "folder/ServerDescription.h"
+#include "posix/NativePath.h"
 #include "service/HotFolderListEntries.h"
 
 namespace
@@ -93,26 +97,49 @@ bool CreateHotFolder(const wxString& folder, const wxString& name, const Printer
     return created;
 }
 
+namespace
+{
+// As "settings --printer none", and the PPD kept from an earlier queue or
+// file goes too: the folder prints nowhere and says so. Its server
+// description stays, with the papers the settings name.
+bool UnbindFolderFully(const wxString& folder, wxString& error)
+{
+    if (!UnbindFolder(folder, error))
+        return false;
+    const wxString ppd = StoredPpdPath(folder);
+    if (unlink(posix::NativePath(ppd).c_str()) == 0 || errno == ENOENT)
+        return true;
+    error = wxString::Format(_("Cannot remove %s: %s"), posix::ShownLine(ppd),
+                             wxString::FromUTF8(std::strerror(errno)));
+    return false;
+}
+
+bool Rebind(const wxString& folder, const PrinterChoice& choice, wxString& error)
+{
+    if (SameChoice(choice, CurrentPrinterChoice(folder)))
+        return true;
+    switch (choice.kind)
+    {
+    case PrinterChoice::Kind::None:
+        return UnbindFolderFully(folder, error);
+    case PrinterChoice::Kind::Queue:
+        return BindFolderToQueue(folder, choice.value, error);
+    case PrinterChoice::Kind::PpdFile:
+        return BindFolderToPpd(folder, choice.value, error);
+    }
+    return true;
+}
+} // namespace
+
 bool ChangeFolderSetup(const wxString& folder, const wxString& name, const PrinterChoice& choice,
                        wxString& error)
 {
     HotFolder hotFolder;
     if (!hotFolder.Open(folder, error))
         return false;
-    if (name != hotFolder.GetName() && !hotFolder.SaveName(name, error))
-        return false;
-    if (SameChoice(choice, CurrentPrinterChoice(folder)))
-        return true;
-    switch (choice.kind)
-    {
-    case PrinterChoice::Kind::None:
-        return UnbindFolder(hotFolder.GetFolder(), error);
-    case PrinterChoice::Kind::Queue:
-        return BindFolderToQueue(hotFolder.GetFolder(), choice.value, error);
-    case PrinterChoice::Kind::PpdFile:
-        return BindFolderToPpd(hotFolder.GetFolder(), choice.value, error);
-    }
-    return true;
+    // The printer first: a queue or file that cannot be had changes nothing.
+    return Rebind(hotFolder.GetFolder(), choice, error) &&
+           (name == hotFolder.GetName() || hotFolder.SaveName(name, error));
 }
 
 PrinterChoice CurrentPrinterChoice(const wxString& folder)

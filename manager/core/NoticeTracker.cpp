@@ -41,9 +41,12 @@ void NoticeTracker::ReadFailures(const FolderRow& row, Seen& seen, bool learnOnl
 void NoticeTracker::ReadPrintFailures(const FolderRow& row, Seen& seen, bool learnOnly,
                                       std::vector<Notice>& notices)
 {
-    if (!learnOnly && seen.lastPrintFailure == row.status.lastPrintFailure)
+    // The same verdict again changes the count, not the last line's words.
+    if (!learnOnly && seen.lastPrintFailure == row.status.lastPrintFailure &&
+        seen.printFailedToday == row.status.printFailedToday)
         return;
     seen.lastPrintFailure = row.status.lastPrintFailure;
+    seen.printFailedToday = row.status.printFailedToday;
     for (const PrintedLine& line :
          ReadPrintedLog(db::PathResolver::GetContainerFolderPath(row.path)))
     {

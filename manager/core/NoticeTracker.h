@@ -31,7 +31,7 @@ private:
     {
         // What the status counted when the logs were last read: they are read
         // again only when it changes.
-        size_t failedTotal = 0;
+        size_t failedTotal = 0, printFailedToday = 0;
         wxString lastFailure, lastPrintFailure;
         std::set<std::string> failures;
         std::set<std::string> printFailures;

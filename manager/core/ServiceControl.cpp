@@ -167,14 +167,17 @@ bool StartService(wxString& error)
 bool PauseService(wxString& error)
 {
     const wxString marker = db::PathResolver::GetStopAllHFFilePath().GetFullPath();
-    const int fd = open(posix::NativePath(marker).c_str(), O_WRONLY | O_CREAT | O_CLOEXEC, 0666);
-    if (fd < 0)
+    const int fd =
+        open(posix::NativePath(marker).c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
+    // Paused already: whoever made the marker, it stands.
+    if (fd < 0 && errno != EEXIST)
     {
         error = wxString::Format(_("Cannot pause the hot folders: cannot make %s: %s"),
                                  posix::ShownLine(marker), Reason(errno));
         return false;
     }
-    close(fd);
+    if (fd >= 0)
+        close(fd);
     return true;
 }
 
