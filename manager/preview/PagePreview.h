@@ -34,7 +34,8 @@ struct PreviewOptions
 };
 
 // Blocking; gs -dSAFER from an argument vector, limited in time, processor
-// time and memory. Only the first page.
+// time and memory. Only the first page; a page that sets no size is shown
+// on A4.
 PagePreview RenderPagePreview(const wxString& postscript, const PreviewOptions& options);
 
 // The same, ended early (ok false) once stopFd becomes readable: what a
