@@ -108,6 +108,41 @@ protected:
     }
 };
 
+TEST_F(ManagerWindow, ALiveListKeepsTheSelectedRowAcrossRescans)
+{
+    auto rows = [](const std::string& keys, std::vector<std::vector<wxString>>& texts)
+    {
+        std::vector<wxString> list;
+        texts.clear();
+        for (const std::string& key :
+             keys == "-" ? testkit::CaseFields{} : testkit::Split(keys, ","))
+        {
+            list.push_back(key);
+            texts.push_back({key, "cell of " + key});
+        }
+        return list;
+    };
+    for (const auto& c : Cases("manager/ui-live-list.txt", 4, 6))
+    {
+        SCOPED_TRACE(c[0] + " | " + c[1] + " | " + c[2]);
+        auto* list = new LiveList(&Frame(), {"key", "text"});
+        std::vector<std::vector<wxString>> texts;
+        std::vector<wxString> keys = rows(c[0], texts);
+        list->ShowRows(texts, keys);
+        if (c[1] != "-")
+            list->SelectKey(c[1]);
+        keys = rows(c[2], texts);
+        list->ShowRows(texts, keys);
+        EXPECT_EQ(c[3] == "-" ? "" : c[3], list->SelectedKey().utf8_string());
+        EXPECT_EQ(c[3] == "-" ? -1 : std::find(keys.begin(), keys.end(), c[3]) - keys.begin(),
+                  list->SelectedIndex());
+        ASSERT_EQ(static_cast<int>(keys.size()), list->GetItemCount());
+        for (size_t row = 0; row < keys.size(); ++row)
+            EXPECT_EQ("cell of " + keys[row], list->GetItemText(static_cast<long>(row), 1));
+        list->Destroy();
+    }
+}
+
 TEST_F(ManagerWindow, ServiceBarFollowsTheService)
 {
     std::unique_ptr<host_test::BackgroundHost> service;
