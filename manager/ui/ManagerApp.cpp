@@ -1,4 +1,7 @@
 // hotfolder-manager: the desktop window over the machine's hot folders.
+#include <cstdio>
+#include <cstring>
+
 #include <wx/app.h>
 #include <wx/cmdline.h>
 #include <wx/intl.h>
@@ -52,4 +55,21 @@ private:
     wxString m_module;
 };
 
-wxIMPLEMENT_APP(ManagerApp);
+wxIMPLEMENT_APP_NO_MAIN(ManagerApp);
+
+// The toolkit needs a display before it reads the command line; the usage
+// is told without one.
+int main(int argc, char** argv)
+{
+    for (int i = 1; i < argc; ++i)
+        if (std::strcmp(argv[i], "--help") == 0 || std::strcmp(argv[i], "-h") == 0)
+        {
+            std::puts("usage: hotfolder-manager [--module PATH]\n"
+                      "\n"
+                      "The window over this machine's hot folders: their printers, jobs and\n"
+                      "the pages their outputs make. --module names the filter module\n"
+                      "(default: $HOTFOLDER_MODULE, else the one installed beside this program).");
+            return 0;
+        }
+    return wxEntry(argc, argv);
+}
