@@ -245,6 +245,31 @@ TEST_F(ManagerWindow, AddsFoldersBoundAsChosenAndStoresThePanelsSettings)
     unsetenv("CUPS_SERVER");
 }
 
+// Answers the folder dialog as a user who picks a folder and presses OK.
+class AddFolderAs : public wxExpectModalBase<FolderDialog>
+{
+public:
+    explicit AddFolderAs(const std::string& folder) : m_folder(folder) {}
+
+protected:
+    int OnInvoked(FolderDialog* dialog) const override
+    {
+        dialog->FolderPicker().SetPath(wxString::FromUTF8(m_folder));
+        return dialog->Accept() ? wxID_OK : wxID_CANCEL;
+    }
+
+private:
+    std::string m_folder;
+};
+
+TEST_F(ManagerWindow, AFolderAddedThroughTheWindowIsListedAndSelected)
+{
+    const std::string folder = scratch + "/new/Proofs";
+    wxTEST_DIALOG(Frame().AddFolder(), AddFolderAs(folder));
+    EXPECT_TRUE(PumpUntil([&] { return Frame().SelectedFolder() == wxString::FromUTF8(folder); }));
+    EXPECT_EQ("Proofs", Cell(Frame().Folders(), RowOf(folder), 0)); // the folder's own name
+}
+
 TEST_F(ManagerWindow, DroppedFilesBecomeJobsAndAFailedOneCanBeRetried)
 {
     const std::string folder = MakePostScriptFolder();
