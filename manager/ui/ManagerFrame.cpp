@@ -1,5 +1,7 @@
 #include "ui/ManagerFrame.h"
 
+#include <algorithm>
+
 #include <wx/accel.h>
 #include <wx/button.h>
 #include <wx/msgdlg.h>
@@ -143,6 +145,12 @@ void ManagerFrame::ShowSnapshot(const StatusSnapshot& snapshot)
         keys.push_back(row.path);
     }
     m_folders->ShowRows(texts, keys);
+    if (!m_selectWhenListed.empty() &&
+        std::find(keys.begin(), keys.end(), m_selectWhenListed) != keys.end())
+    {
+        m_folders->SelectKey(m_selectWhenListed);
+        m_selectWhenListed.clear();
+    }
     ShowJobs(snapshot);
     for (const Notice& notice : m_notices.Update(m_rows))
     {
@@ -211,8 +219,8 @@ void ManagerFrame::AddFolder()
     FolderDialog dialog(this, m_modulePath);
     if (dialog.ShowModal() != wxID_OK)
         return;
+    m_selectWhenListed = dialog.Folder(); // listed by the next rescan
     RescanNow();
-    m_folders->SelectKey(dialog.Folder());
 }
 
 void ManagerFrame::EditSelectedFolder()

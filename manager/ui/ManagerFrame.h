@@ -69,6 +69,7 @@ private:
     NoticeTracker m_notices;
     std::function<void(const Notice&)> m_noticeSink;
     size_t m_rescans = 0;
+    wxString m_selectWhenListed; // a folder just added
     wxTimer m_timer;
     // Joined before the window's parts go.
     std::unique_ptr<StatusPoller> m_poller;
