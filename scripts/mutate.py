@@ -59,6 +59,7 @@ AREAS = OrderedDict([
     ("host", ["host", "service"]),
     ("printing", ["ppd", "host", "service"]),
     ("posix", ["engine", "store", "machine", "host", "service"]),
+    ("manager", ["manager"]),
 ])
 
 # ---------------------------------------------------------------- tokens

@@ -38,7 +38,7 @@ public:
     void Request(const wxString& jobsFolder);
 
     // How many jobs of a folder a snapshot holds.
-    static constexpr size_t kJobsShown = 200;
+    static constexpr size_t kJobsShown = 1000;
 
 private:
     void Run();

@@ -1,7 +1,7 @@
 # Builds the Debian package from the build tree, unpacks it into a scratch
 # root and runs the packaged host from there.
 #   cmake -DBUILD_DIR=... -DSCRATCH=... -P PackageInstallTest.cmake
-foreach(built bin/hotfolder lib/hotfolder/filters/EPS.so)
+foreach(built bin/hotfolder bin/hotfolder-manager lib/hotfolder/filters/EPS.so)
   if(NOT EXISTS "${BUILD_DIR}/${built}")
     message(FATAL_ERROR "${BUILD_DIR}/${built} is missing: build the whole tree "
       "(targets hotfolder and EPS) before packaging")
@@ -40,11 +40,20 @@ if(NOT unpacked EQUAL 0)
 endif()
 set(root "${SCRATCH}/root/usr")
 foreach(file bin/hotfolder lib/hotfolder/filters/EPS.so include/hotfolder/HFPlugin.h
-    lib/cmake/HotFolderSDK/HotFolderSDKConfig.cmake lib/systemd/system/hotfolder.service)
+    lib/cmake/HotFolderSDK/HotFolderSDKConfig.cmake lib/systemd/system/hotfolder.service
+    bin/hotfolder-manager share/applications/hotfolder-manager.desktop
+    share/icons/hicolor/scalable/apps/hotfolder-manager.svg)
   if(NOT EXISTS "${root}/${file}")
     message(FATAL_ERROR "the package lacks /usr/${file}")
   endif()
 endforeach()
+# The desktop entry as installed must satisfy the desktops' own checker.
+find_program(DESKTOP_FILE_VALIDATE desktop-file-validate REQUIRED)
+execute_process(COMMAND "${DESKTOP_FILE_VALIDATE}" "${root}/share/applications/hotfolder-manager.desktop"
+  RESULT_VARIABLE valid OUTPUT_VARIABLE complaints ERROR_VARIABLE complaints)
+if(NOT valid EQUAL 0 OR NOT complaints STREQUAL "")
+  message(FATAL_ERROR "the desktop entry is not clean:\n${complaints}")
+endif()
 file(GLOB sdk_libs "${root}/lib/libhotfolder_sdk.so*")
 file(GLOB_RECURSE catalogues "${root}/share/hotfolder/locale/*.mo")
 if(NOT sdk_libs OR NOT catalogues)
