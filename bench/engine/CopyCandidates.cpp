@@ -142,9 +142,9 @@ const std::vector<CopyCandidate>& CopyCandidates()
         {"sendfile", SendFile},
         {"splice_64k", [](int in, off_t at, size_t n, int out)
          { return Splice(in, at, n, out, 0, false, false); }},
+        // The engine's way.
         {"splice_1m", [](int in, off_t at, size_t n, int out)
          { return Splice(in, at, n, out, kMegabyte, false, false); }},
-        // The engine's way.
         {"splice_1m_aligned", [](int in, off_t at, size_t n, int out)
          { return Splice(in, at, n, out, kMegabyte, true, false); }},
         {"splice_1m_aligned_fadvise", [](int in, off_t at, size_t n, int out)

@@ -3,7 +3,6 @@
 #include <cstdio>
 #include <string>
 
-#include "BodyAlignment.h"
 #include "EPStoPS.h"
 #include "EngineMessages.h"
 #include "FailureRecord.h"
@@ -28,27 +27,28 @@ void ReplaceAll(std::string& text, const std::string& from, const std::string& t
         text.replace(at, from.size(), to);
 }
 
-// The header as written: the locale's decimal point in its texts turned into
-// "." (the numbers already carry "."; the host expects the title and the
-// setpagedevice text to follow), and a large body's start aligned.
-std::string FinalHeader(std::string header, const std::string& decimalPoint, const EPSinfo_t& info)
-{
-    if (!LocaleUsesFullStop(decimalPoint))
-        ReplaceAll(header, decimalPoint, ".");
-    AlignBodyStart(header, static_cast<unsigned long>(info.psOffset),
-                   static_cast<unsigned long>(info.psLength));
-    return header;
-}
-
 // False when the header could not be written; the caller then stops.
-bool WriteHeader(FILE* out, const std::string& header)
+bool WriteHeader(FILE* out, std::string header, const std::string& decimalPoint)
 {
-    if (header.empty() || fwrite(header.data(), 1, header.size(), out) != header.size())
+    if (LocaleUsesFullStop(decimalPoint))
+    {
+        if (header.empty() || fwrite(header.data(), 1, header.size(), out) != header.size())
+        {
+            WriteEngineMessage("Error from fwrite in ConvertEPStoPS\n");
+            return false;
+        }
+        return true;
+    }
+    // The numbers already carry "."; what the host expects besides is that the
+    // locale's decimal point turns into "." in the texts too (the title and
+    // the setpagedevice text).
+    if (header.empty())
     {
         WriteEngineMessage("Error from fwrite in ConvertEPStoPS\n");
         return false;
     }
-    return true;
+    ReplaceAll(header, decimalPoint, ".");
+    return fwrite(header.data(), 1, header.size(), out) == header.size();
 }
 } // namespace
 
@@ -80,7 +80,7 @@ int ConvertEPStoPS(void** context, const EPStoPSparams_t* params, const char* ou
                                                    layout, params->setPageDeviceString);
     int result = 0;
     errno = 0;
-    if (WriteHeader(out, FinalHeader(header, decimalPoint, *info)))
+    if (WriteHeader(out, header, decimalPoint))
     {
         ExtractEPSfromTIFFpreview(info->epsFile, out, static_cast<long>(info->psOffset),
                                   static_cast<long>(info->psLength));
