@@ -27,13 +27,27 @@ wxString PrinterText(const FolderStatus& status)
     return _("output only");
 }
 
+// The status code's English words for the output type and a custom page,
+// in the window's language; paper names stay as the printer calls them.
+wxString OutputTypeText(const FolderStatus& status)
+{
+    return wxGetTranslation(status.outputType);
+}
+
+wxString PageText(const FolderStatus& status)
+{
+    return status.page == "custom" ? wxGetTranslation(status.page) : Shown(status.page);
+}
+
 wxString PrinterStateText(const FolderStatus& status)
 {
     if (!status.problem.empty())
         return wxString::Format(_("cannot be served: %s"), Shown(status.problem));
     if (status.queue.empty())
         return wxString();
-    wxString text = Shown(wxString::FromUTF8(status.queueState));
+    // The scheduler's words for its three states read in the window's
+    // language; anything else is shown as it came.
+    wxString text = wxGetTranslation(Shown(wxString::FromUTF8(status.queueState)));
     for (const std::string& reason : status.queueReasons)
         text += (text.empty() ? "" : ", ") + Shown(wxString::FromUTF8(reason));
     if (!status.printingHeld.empty())
@@ -55,7 +69,7 @@ std::vector<wxString> FolderColumnTexts(const FolderRow& row)
 {
     const FolderStatus& status = row.status;
     return {Shown(row.name),         Shown(row.path),           PrinterText(status),
-            Shown(status.page),      Shown(status.outputType),  Count(status.waiting),
+            PageText(status),        OutputTypeText(status),    Count(status.waiting),
             Count(status.doneToday), Count(status.failedToday), Count(status.printedToday),
             PrinterStateText(status)};
 }

@@ -198,6 +198,12 @@ bool FolderDialog::Accept()
         Refuse(error);
         return false;
     }
+    // Made or changed: should the settings fail below, OK again changes the
+    // folder instead of making it twice.
+    m_folder = folder;
+    m_folderPicker->Disable();
+    m_storedName = name;
+    m_storedPrinter = printer;
     HotFolder stored;
     if (m_session && m_panel && !(stored.Open(folder, error) && stored.SaveFilter(filter, error)))
     {
@@ -206,9 +212,5 @@ bool FolderDialog::Accept()
     }
     if (!warnings.empty())
         wxMessageBox(warnings, GetTitle(), wxOK | wxICON_INFORMATION, this);
-    if (m_folder.empty())
-        m_folder = folder; // made: OK again changes it instead of making it twice
-    m_storedName = name;
-    m_storedPrinter = printer;
     return true;
 }

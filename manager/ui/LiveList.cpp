@@ -13,6 +13,9 @@ void LiveList::ShowRows(const std::vector<std::vector<wxString>>& rows,
                         const std::vector<wxString>& keys)
 {
     const wxString selected = SelectedKey();
+    // Columns fit their texts again whenever a text changes (a reason that
+    // appears later must not stay cut off), not on every rescan.
+    bool changed = keys != m_keys;
     Freeze();
     while (GetItemCount() > static_cast<int>(rows.size()))
         DeleteItem(GetItemCount() - 1);
@@ -23,14 +26,16 @@ void LiveList::ShowRows(const std::vector<std::vector<wxString>>& rows,
             InsertItem(item, wxString());
         for (size_t column = 0; column < rows[i].size(); ++column)
             if (GetItemText(item, static_cast<int>(column)) != rows[i][column])
+            {
                 SetItem(item, static_cast<int>(column), rows[i][column]);
+                changed = true;
+            }
     }
-    const bool firstFill = m_keys.empty() && !keys.empty();
     m_keys = keys;
     Thaw();
     if (!selected.empty() && SelectedKey() != selected)
         SelectKey(selected);
-    if (firstFill)
+    if (changed)
         for (int column = 0; column < GetColumnCount(); ++column)
             SetColumnWidth(column, wxLIST_AUTOSIZE_USEHEADER);
 }

@@ -1,4 +1,5 @@
 // hotfolder-manager: the desktop window over the machine's hot folders.
+#include <clocale>
 #include <cstdio>
 #include <cstring>
 
@@ -44,6 +45,10 @@ public:
     {
         if (!wxApp::OnInit())
             return false;
+        // The toolkit keeps the C locale; the messages category alone follows
+        // the desktop, so that the toolkit's own buttons (Cancel, the file
+        // choosers) speak its language while numbers keep their ".".
+        std::setlocale(LC_MESSAGES, "");
         HFTranslations::GetInstance()->SelectLanguage(UserLanguage());
         SetAppDisplayName(_("Hot folders"));
         auto* frame = new ManagerFrame(LocateFilterModule(m_module));

@@ -50,7 +50,7 @@ ManagerFrame::ManagerFrame(const wxString& modulePath)
 
     auto* columns = new wxBoxSizer(wxHORIZONTAL);
     columns->Add(folders, 3, wxEXPAND | wxRIGHT, 10);
-    columns->Add(m_preview, 2, wxEXPAND);
+    columns->Add(m_preview, 1, wxEXPAND);
     auto* sizer = new wxBoxSizer(wxVERTICAL);
     sizer->Add(m_service, 0, wxEXPAND | wxALL, 10);
     sizer->Add(columns, 1, wxEXPAND | wxLEFT | wxRIGHT | wxBOTTOM, 10);

@@ -1,7 +1,14 @@
-// Renders the manager's window (two folders of a scratch warehouse, one made
-// for a printer's PPD and one output only, and a job's page) and its folder
-// dialog to PNG files for the documentation (scripts/screenshots.sh).
-// Usage: manager_screenshots <dir> <en|de>
+// Renders the manager's window (two folders of a scratch warehouse, one
+// printing on a queue of a scheduler of its own with the service running,
+// one output only, and a printed job's page) and its folder dialog to PNG files for the
+// documentation (scripts/screenshots.sh). Usage: manager_screenshots <dir> <en|de>
+#include <signal.h>
+#include <sys/stat.h>
+
+#include <clocale>
+#include <cstdio>
+#include <memory>
+
 #include <wx/app.h>
 #include <wx/dcmemory.h>
 #include <wx/dcscreen.h>
@@ -12,6 +19,7 @@
 #include <hotfolder/HFTranslations.h>
 
 #include "GermanClient.h"
+#include "PrivateCupsd.h"
 #include "TestKit.h"
 #include "ui/FolderDialog.h"
 #include "ui/LiveList.h"
@@ -35,19 +43,60 @@ bool Host(const std::vector<std::string>& args)
     return testkit::RunProgram(command).exitCode == 0;
 }
 
-// Two folders, the first with one converted job.
+// A scheduler of the pictures' own with one queue printing into a file,
+// and the service running over the warehouse: what an operator sees.
+struct Machine
+{
+    std::unique_ptr<cups_test::PrivateCupsd> cups;
+    pid_t service = -1;
+    ~Machine()
+    {
+        if (service > 0)
+        {
+            kill(service, SIGTERM);
+            testkit::WaitProgram(service);
+        }
+    }
+};
+
+bool StartMachine(Machine& machine)
+{
+    const std::string root = Scratch().Sub("cups");
+    chmod(Scratch().Path().c_str(), 0755);
+    machine.cups = std::make_unique<cups_test::PrivateCupsd>(root);
+    std::string problem;
+    if (!machine.cups->Start(problem) ||
+        !machine.cups->AddFileQueue("office", HF_TEST_DATA_DIR "/ppd/test-postscript.ppd",
+                                    Scratch().File("printed.ps"), problem))
+    {
+        std::fprintf(stderr, "manager_screenshots: %s\n", problem.c_str());
+        return false;
+    }
+    setenv("CUPS_SERVER", machine.cups->Server().c_str(), 1);
+    machine.service = testkit::StartProgram({HF_HOTFOLDER_EXE, "serve"}, "/dev/null",
+                                            Scratch().File("serve.txt"));
+    return machine.service > 0;
+}
+
+// Two folders, the first printing on the scheduler's queue, the second
+// keeping EPS outputs.
 bool MakeFolders(std::string& posters)
 {
     posters = Scratch().Sub("Posters");
     const std::string proofs = Scratch().Sub("Proofs");
-    return Host({"init", posters, "--ppd", HF_TEST_DATA_DIR "/ppd/test-postscript.ppd", "--name",
-                 "Posters A4"}) &&
+    return Host({"init", posters, "--printer", "office", "--name", "Posters A4"}) &&
            Host({"settings", posters, "--set", "OUTPUTFILETYPEEPS=0", "OUTPUTFILETYPEPS=1",
                  "DEFAULTPAGESIZE=A4"}) &&
-           Host({"init", proofs, "--name", "Proofs"}) &&
-           testkit::WriteFile(posters + "/label.eps",
-                              testkit::ReadFile(kExamples + "/eps/label.eps")) &&
-           Host({"run", posters});
+           Host({"init", proofs, "--name", "Proofs"});
+}
+
+// Drops the example label into the folder the way a file manager's copy
+// lands: written aside, then renamed in.
+bool DropLabel(const std::string& folder)
+{
+    const std::string aside = folder + "/.label.eps.part";
+    return testkit::WriteFile(aside, testkit::ReadFile(kExamples + "/eps/label.eps")) &&
+           rename(aside.c_str(), (folder + "/label.eps").c_str()) == 0;
 }
 
 bool Wait(const std::function<bool()>& condition)
@@ -89,19 +138,26 @@ public:
             return false;
         const wxString prefix = argv[1] + "/manager", suffix = "-" + argv[2] + ".png";
         wxInitAllImageHandlers();
+        std::setlocale(LC_MESSAGES, ""); // as the manager does
         HFTranslations::GetInstance()->SelectLanguage(argv[2]);
         std::string posters;
-        if (!MakeFolders(posters))
+        if (!StartMachine(m_machine) || !MakeFolders(posters))
             return false;
 
         auto* frame = new ManagerFrame(HF_MODULE_PATH);
         frame->SetNoticeSink([](const Notice&) {});
-        frame->SetSize(wxRect(0, 0, 1200, 640));
+        frame->SetSize(wxRect(0, 0, 1960, 680));
         frame->Show();
         const wxString folder = wxString::FromUTF8(posters);
         m_ok = Wait([&] { return frame->Folders().GetItemCount() == 2; });
         frame->Folders().SelectKey(folder);
-        m_ok = m_ok && Wait([&] { return !frame->ShownJobs().empty(); });
+        m_ok = m_ok && DropLabel(posters) &&
+               Wait(
+                   [&]
+                   {
+                       const auto& jobs = frame->ShownJobs();
+                       return !jobs.empty() && jobs.front().outcome == JobOutcome::Printed;
+                   });
         if (m_ok)
         {
             frame->Jobs().SelectKey(frame->Jobs().Keys().front());
@@ -130,6 +186,7 @@ public:
 
 private:
     bool m_ok = false;
+    Machine m_machine;
 };
 } // namespace
 

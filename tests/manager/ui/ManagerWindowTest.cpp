@@ -100,6 +100,21 @@ protected:
             },
             60000);
     }
+    // A scheduler of the test's own, named by CUPS_SERVER for the window and
+    // the programs it starts, with the queue "office" printing into a file.
+    void StartScheduler(std::unique_ptr<cups_test::PrivateCupsd>& cups)
+    {
+        ASSERT_TRUE(cups_test::PrivateCupsd::Installed()) << cups_test::PrivateCupsd::kMissing;
+        chmod(scratch.c_str(), 0755);
+        mkdir((scratch + "/cups").c_str(), 0755);
+        cups = std::make_unique<cups_test::PrivateCupsd>(scratch + "/cups");
+        std::string problem;
+        ASSERT_TRUE(cups->Start(problem)) << problem;
+        setenv("CUPS_SERVER", cups->Server().c_str(), 1);
+        ASSERT_TRUE(cups->AddFileQueue("office", kData + "/ppd/test-postscript.ppd",
+                                       scratch + "/device.ps", problem))
+            << problem;
+    }
     void Select(const std::string& folder)
     {
         ASSERT_TRUE(PumpUntil([&] { return RowOf(folder) >= 0; })) << folder;
@@ -188,25 +203,12 @@ TEST_F(ManagerWindow, ShowsGermanTextsUnderAGermanLanguage)
 TEST_F(ManagerWindow, AddsFoldersBoundAsChosenAndStoresThePanelsSettings)
 {
     std::unique_ptr<cups_test::PrivateCupsd> cups;
-    if (cups_test::PrivateCupsd::Installed())
-    {
-        chmod(scratch.c_str(), 0755);
-        mkdir((scratch + "/cups").c_str(), 0755);
-        cups = std::make_unique<cups_test::PrivateCupsd>(scratch + "/cups");
-        std::string problem;
-        ASSERT_TRUE(cups->Start(problem)) << problem;
-        setenv("CUPS_SERVER", cups->Server().c_str(), 1);
-        ASSERT_TRUE(cups->AddFileQueue("office", kData + "/ppd/test-postscript.ppd",
-                                       scratch + "/device.ps", problem))
-            << problem;
-    }
+    ASSERT_NO_FATAL_FAILURE(StartScheduler(cups));
     // printer | its value | the file binding it in the container | a control of
     // the panel clicked | the setting Folder.cfg then holds
     for (const auto& c : Cases("manager/ui-add-folder.txt", 5, 3))
     {
         SCOPED_TRACE(c[0] + " " + c[1]);
-        if (c[0] == "queue" && !cups)
-            continue;
         const std::string folder = scratch + "/added-" + c[0] + "-" + c[3];
         auto* dialog = new FolderDialog(&Frame(), HF_MODULE_PATH);
         dialog->FolderPicker().SetPath(folder);
@@ -242,6 +244,24 @@ TEST_F(ManagerWindow, AddsFoldersBoundAsChosenAndStoresThePanelsSettings)
         ASSERT_TRUE(PumpUntil([&] { return RowOf(folder) >= 0; }));
         EXPECT_EQ("Added " + c[0] + " " + c[3], Cell(Frame().Folders(), RowOf(folder), 0));
     }
+    unsetenv("CUPS_SERVER");
+}
+
+TEST_F(ManagerWindow, AFileDroppedOnAPrintingFolderIsShownPrinted)
+{
+    std::unique_ptr<cups_test::PrivateCupsd> cups;
+    ASSERT_NO_FATAL_FAILURE(StartScheduler(cups));
+    const std::string folder = scratch + "/Office";
+    ASSERT_EQ(0, Host({"init", folder, "--printer", "office"}).exitCode);
+    auto service =
+        std::make_unique<host_test::BackgroundHost>(std::vector<std::string>{"serve"}, scratch);
+    Select(folder);
+    ASSERT_TRUE(Drop(folder, {kExamples + "/eps/label.eps"}));
+    EXPECT_TRUE(JobShown("label.eps", "printed")) << service->Err();
+    // The folder's row counts it and says what the scheduler says of its queue.
+    EXPECT_TRUE(PumpUntil([&] { return Cell(Frame().Folders(), RowOf(folder), 8) == "1"; }));
+    EXPECT_EQ("office", Cell(Frame().Folders(), RowOf(folder), 2));
+    EXPECT_FALSE(Cell(Frame().Folders(), RowOf(folder), 9).empty());
     unsetenv("CUPS_SERVER");
 }
 
