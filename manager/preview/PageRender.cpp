@@ -9,6 +9,8 @@
 #include <fstream>
 #include <sstream>
 
+#include <wx/intl.h>
+
 #include "posix/CLocale.h"
 #include "posix/Directories.h"
 #include "posix/NativePath.h"
@@ -109,12 +111,13 @@ PagePreview RenderPagePreview(const wxString& postscript, const PreviewOptions& 
     preview.imageable = options.imageable;
     const std::string file = posix::NativePath(postscript);
     if (!IsReadableFile(file))
-        return Failed(preview, "cannot find the file " + posix::ShownLine(postscript));
+        return Failed(preview,
+                      wxString::Format(_("cannot find the file %s"), posix::ShownLine(postscript)));
     std::string missing;
     const std::string gs = LocateGhostscript(options.ghostscript, missing);
     if (gs.empty())
-        return Failed(preview,
-                      "Ghostscript is not installed (" + wxString::FromUTF8(missing) + ")");
+        return Failed(preview, wxString::Format(_("Ghostscript is not installed (%s)"),
+                                                wxString::FromUTF8(missing)));
 
     const posix::ChildLimits limits = PreviewLimits(options.timeoutSeconds, stopFd);
     const posix::ChildRun probe =
@@ -123,13 +126,13 @@ PagePreview RenderPagePreview(const wxString& postscript, const PreviewOptions& 
     if (!failure.empty())
         return Failed(preview, failure);
     if (!ReadProbe(probe, preview))
-        return Failed(preview, "the file prints no page");
+        return Failed(preview, _("the file prints no page"));
 
     const int side = std::clamp(options.longestSide, kSmallestSide, kLargestSide);
     const double dpi = side * 72.0 / std::max(preview.pageWidth, preview.pageHeight);
     ScratchFolder scratch;
     if (scratch.Path().empty())
-        return Failed(preview, "cannot make a temporary folder for the preview");
+        return Failed(preview, _("cannot make a temporary folder for the preview"));
     const std::string raster = scratch.Path() + "/page.ppm";
     char resolution[64];
     std::snprintf(resolution, sizeof resolution, "-r%.4f", dpi);
@@ -140,7 +143,7 @@ PagePreview RenderPagePreview(const wxString& postscript, const PreviewOptions& 
         return Failed(preview, failure);
     preview.image = DecodePpm(ReadAll(raster));
     if (!preview.image.IsOk())
-        return Failed(preview, "Ghostscript wrote no readable page");
+        return Failed(preview, _("Ghostscript wrote no readable page"));
     preview.ok = true;
     return preview;
 }

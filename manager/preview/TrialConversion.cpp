@@ -7,6 +7,7 @@
 #include <memory>
 
 #include <wx/filename.h>
+#include <wx/intl.h>
 #include <wx/log.h>
 
 #include "folder/FileMoves.h"
@@ -40,22 +41,22 @@ bool CheckPlaces(const HotFolder& folder, const wxFileName& eps, const wxFileNam
 {
     if (!IsRegularFile(eps.GetFullPath()))
     {
-        error = "cannot find the file " + posix::ShownLine(eps.GetFullPath());
+        error = wxString::Format(_("cannot find the file %s"), posix::ShownLine(eps.GetFullPath()));
         return false;
     }
     if (!wxFileName::DirExists(output.GetPath()))
     {
-        error = "there is no folder " + posix::ShownLine(output.GetPath());
+        error = wxString::Format(_("there is no folder %s"), posix::ShownLine(output.GetPath()));
         return false;
     }
     if (SameFile(eps.GetFullPath(), output.GetFullPath()))
     {
-        error = "the output would replace the file tried";
+        error = _("the output would replace the file tried");
         return false;
     }
     if (wxFileName::DirName(output.GetPath()).SameAs(wxFileName::DirName(folder.GetFolder())))
     {
-        error = "a trial's output cannot go into the hot folder itself";
+        error = _("a trial's output cannot go into the hot folder itself");
         return false;
     }
     return true;
@@ -72,8 +73,9 @@ bool ConvertIn(FilterSession& session, const HotFolder& folder, const wxString& 
     if (jobs.empty())
     {
         const wxString reason = session.RefusalReason(eps);
-        error = posix::ShownLine(wxFileName(eps).GetFullName()) + " is not a file the " +
-                session.Info().m_strDisplayName + " filter accepts" +
+        error = wxString::Format(_("%s is not a file the %s filter accepts"),
+                                 posix::ShownLine(wxFileName(eps).GetFullName()),
+                                 session.Info().m_strDisplayName) +
                 (reason.empty() ? wxString() : ": " + reason);
         return false;
     }
@@ -83,9 +85,10 @@ bool ConvertIn(FilterSession& session, const HotFolder& folder, const wxString& 
     const JobOutput result = ProcessJob(session.Filter(), jobs[0], work, nullptr);
     if (result.status != 0 || result.producedPath.empty())
     {
-        error = "cannot convert " + posix::ShownLine(wxFileName(eps).GetFullName()) + ": " +
-                (result.status != 0 ? session.DescribeStatus(result.status)
-                                    : wxString("the filter wrote no output"));
+        error = wxString::Format(_("cannot convert %s: %s"),
+                                 posix::ShownLine(wxFileName(eps).GetFullName()),
+                                 result.status != 0 ? session.DescribeStatus(result.status)
+                                                    : _("the filter wrote no output"));
         return false;
     }
     wxString produced = result.producedPath;
@@ -98,7 +101,7 @@ bool ConvertIn(FilterSession& session, const HotFolder& folder, const wxString& 
     }
     if (!wxRenameFile(produced, target, true))
     {
-        error = "cannot write " + posix::ShownLine(target);
+        error = wxString::Format(_("cannot write %s"), posix::ShownLine(target));
         return false;
     }
     return true;

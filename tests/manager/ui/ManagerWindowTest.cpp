@@ -192,12 +192,19 @@ TEST_F(ManagerWindow, ShowsGermanTextsUnderAGermanLanguage)
     ASSERT_TRUE(HFTranslations::GetInstance()->SelectLanguage("de"));
     std::set<std::string> labels;
     CollectLabels(&Frame(), labels);
+    // The status code's English words in a folder's row read German too.
+    const std::string folder = scratch + "/Proofs";
+    ASSERT_EQ(0, Host({"init", folder}).exitCode);
+    EXPECT_TRUE(PumpUntil([&] { return RowOf(folder) >= 0; }));
+    const std::string outputType =
+        RowOf(folder) >= 0 ? Cell(Frame().Folders(), RowOf(folder), 4) : "";
     HFTranslations::GetInstance()->SelectLanguage("en");
     for (const auto& text : Cases("manager/ui-german.txt", 2, 5))
     {
         EXPECT_EQ(1u, labels.count(text[0])) << text[0];
         EXPECT_EQ(0u, labels.count(text[1])) << text[1];
     }
+    EXPECT_EQ("EPS (unverändert weitergegeben)", outputType);
 }
 
 TEST_F(ManagerWindow, AddsFoldersBoundAsChosenAndStoresThePanelsSettings)
