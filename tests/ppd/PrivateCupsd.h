@@ -11,6 +11,7 @@
 #include <unistd.h>
 
 #include <chrono>
+#include <memory>
 #include <string>
 #include <thread>
 
@@ -117,6 +118,30 @@ public:
                                               ppd.empty() ? "raw" : ppd, "-E"});
         problem = run.err;
         return run.exitCode == 0;
+    }
+
+    // A scheduler under scratch/cups (scratch opened to its filters, which
+    // run as its own user), named in CUPS_SERVER for this process and what
+    // it starts, with one queue printing into device through ppd (none:
+    // raw). Null, and problem says why, when it cannot be had.
+    static std::unique_ptr<PrivateCupsd>
+    StartWithQueue(const std::string& scratch, const std::string& queue, const std::string& ppd,
+                   const std::string& device, std::string& problem)
+    {
+        if (!Installed())
+        {
+            problem = kMissing;
+            return nullptr;
+        }
+        chmod(scratch.c_str(), 0755);
+        mkdir((scratch + "/cups").c_str(), 0755);
+        auto cups = std::make_unique<PrivateCupsd>(scratch + "/cups");
+        if (!cups->Start(problem))
+            return nullptr;
+        setenv("CUPS_SERVER", cups->Server().c_str(), 1);
+        if (!cups->AddFileQueue(queue, ppd, device, problem))
+            return nullptr;
+        return cups;
     }
 
     std::string Server() const { return "127.0.0.1:" + std::to_string(m_port); }

@@ -21,13 +21,9 @@ TEST_F(ServiceTest, KilledAtAnyMomentEveryFileIsDeliveredExactlyOnce)
     std::unique_ptr<cups_test::PrivateCupsd> cups;
     if (cups_test::PrivateCupsd::Installed())
     {
-        chmod(scratch.c_str(), 0755);
-        mkdir((scratch + "/cups").c_str(), 0755);
-        cups = std::make_unique<cups_test::PrivateCupsd>(scratch + "/cups");
         std::string problem;
-        ASSERT_TRUE(cups->Start(problem)) << problem;
-        setenv("CUPS_SERVER", cups->Server().c_str(), 1);
-        ASSERT_TRUE(cups->AddFileQueue("press", "", "/dev/null", problem)) << problem;
+        cups = cups_test::PrivateCupsd::StartWithQueue(scratch, "press", "", "/dev/null", problem);
+        ASSERT_TRUE(cups) << problem;
         WriteFile(Container(folders[0]) + "/PrinterQueue.txt", "press\n");
     }
     const int kKills = 100, kFilesPerFolderAndRound = 5;

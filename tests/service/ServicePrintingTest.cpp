@@ -20,16 +20,11 @@ protected:
         ServiceTest::SetUp();
         if (!cups_test::PrivateCupsd::Installed())
             GTEST_SKIP() << cups_test::PrivateCupsd::kMissing;
-        // The scheduler's filters run as its own user and must reach the spool.
-        chmod(scratch.c_str(), 0755);
-        mkdir((scratch + "/cups").c_str(), 0755);
-        cups = std::make_unique<cups_test::PrivateCupsd>(scratch + "/cups");
         std::string problem;
-        ASSERT_TRUE(cups->Start(problem)) << problem;
-        setenv("CUPS_SERVER", cups->Server().c_str(), 1);
-        ASSERT_TRUE(cups->AddFileQueue("office", HF_TEST_DATA_DIR "/ppd/test-postscript.ppd",
-                                       scratch + "/device.ps", problem))
-            << problem;
+        cups = cups_test::PrivateCupsd::StartWithQueue(scratch, "office",
+                                                       HF_TEST_DATA_DIR "/ppd/test-postscript.ppd",
+                                                       scratch + "/device.ps", problem);
+        ASSERT_TRUE(cups) << problem;
     }
     void TearDown() override { unsetenv("CUPS_SERVER"); }
 

@@ -61,18 +61,15 @@ struct Machine
 
 bool StartMachine(Machine& machine)
 {
-    const std::string root = Scratch().Sub("cups");
-    chmod(Scratch().Path().c_str(), 0755);
-    machine.cups = std::make_unique<cups_test::PrivateCupsd>(root);
     std::string problem;
-    if (!machine.cups->Start(problem) ||
-        !machine.cups->AddFileQueue("office", HF_TEST_DATA_DIR "/ppd/test-postscript.ppd",
-                                    Scratch().File("printed.ps"), problem))
+    machine.cups = cups_test::PrivateCupsd::StartWithQueue(
+        Scratch().Path(), "office", HF_TEST_DATA_DIR "/ppd/test-postscript.ppd",
+        Scratch().File("printed.ps"), problem);
+    if (!machine.cups)
     {
         std::fprintf(stderr, "manager_screenshots: %s\n", problem.c_str());
         return false;
     }
-    setenv("CUPS_SERVER", machine.cups->Server().c_str(), 1);
     machine.service = testkit::StartProgram({HF_HOTFOLDER_EXE, "serve"}, "/dev/null",
                                             Scratch().File("serve.txt"));
     return machine.service > 0;

@@ -104,16 +104,10 @@ protected:
     // the programs it starts, with the queue "office" printing into a file.
     void StartScheduler(std::unique_ptr<cups_test::PrivateCupsd>& cups)
     {
-        ASSERT_TRUE(cups_test::PrivateCupsd::Installed()) << cups_test::PrivateCupsd::kMissing;
-        chmod(scratch.c_str(), 0755);
-        mkdir((scratch + "/cups").c_str(), 0755);
-        cups = std::make_unique<cups_test::PrivateCupsd>(scratch + "/cups");
         std::string problem;
-        ASSERT_TRUE(cups->Start(problem)) << problem;
-        setenv("CUPS_SERVER", cups->Server().c_str(), 1);
-        ASSERT_TRUE(cups->AddFileQueue("office", kData + "/ppd/test-postscript.ppd",
-                                       scratch + "/device.ps", problem))
-            << problem;
+        cups = cups_test::PrivateCupsd::StartWithQueue(
+            scratch, "office", kData + "/ppd/test-postscript.ppd", scratch + "/device.ps", problem);
+        ASSERT_TRUE(cups) << problem;
     }
     void Select(const std::string& folder)
     {
