@@ -4,6 +4,7 @@
 #include <chrono>
 #include <cstring>
 #include <fcntl.h>
+#include <poll.h>
 #include <string>
 #include <sys/stat.h>
 #include <sys/syscall.h>
@@ -60,26 +61,31 @@ std::string HotfolderProgram()
     return std::string();
 }
 
-bool SystemdKnowsTheUnit()
+bool SystemdKnowsTheUnit(int stopFd, bool& stopped)
 {
     struct stat info;
     if (stat("/run/systemd/system", &info) != 0 || !IsExecutable(kSystemctl))
         return false;
     posix::ChildLimits limits;
     limits.wallSeconds = 20;
+    limits.stopFd = stopFd;
     const posix::ChildRun run =
         posix::RunLimitedChild(kSystemctl, {"systemctl", "cat", "--", kUnit}, {}, limits);
+    stopped = run.stopped;
     return run.end == posix::ChildRun::End::Exited && run.code == 0;
 }
 
-bool StartThroughSystemd(wxString& error)
+bool StartThroughSystemd(wxString& error, int stopFd)
 {
     posix::ChildLimits limits;
     limits.wallSeconds = 60;
+    limits.stopFd = stopFd;
     const posix::ChildRun run =
         posix::RunLimitedChild(kSystemctl, {"systemctl", "start", kUnit}, {}, limits);
     if (run.end == posix::ChildRun::End::Exited && run.code == 0)
         return true;
+    if (run.stopped)
+        return false;
     const size_t end = run.err.find('\n');
     error = wxString::Format(_("systemctl could not start %s: %s"), kUnit,
                              posix::ShownLine(wxString::FromUTF8(run.err.substr(0, end))));
@@ -120,24 +126,46 @@ bool SpawnDetached(const std::string& program, wxString& error)
         ;
     return true;
 }
+
+// Sleeps for a while unless stopFd becomes readable first; false then.
+bool PauseUnlessStopped(int stopFd, int milliseconds)
+{
+    if (stopFd < 0)
+    {
+        std::this_thread::sleep_for(std::chrono::milliseconds(milliseconds));
+        return true;
+    }
+    pollfd wanted{stopFd, POLLIN, 0};
+    const int ready = poll(&wanted, 1, milliseconds);
+    return ready == 0 || (ready < 0 && errno == EINTR);
+}
 } // namespace
 
 ServiceState ReadServiceState()
 {
-    if (db::PathResolver::GetStopAllHFFilePath().FileExists())
-        return ServiceState::Paused;
-    return ServiceIsRunning() ? ServiceState::Running : ServiceState::Stopped;
+    // A marker left behind by a service that ended pauses nothing: the
+    // service to resume is not there.
+    if (!ServiceIsRunning())
+        return ServiceState::Stopped;
+    return db::PathResolver::GetStopAllHFFilePath().FileExists() ? ServiceState::Paused
+                                                                 : ServiceState::Running;
 }
 
-bool StartService(wxString& error)
+bool StartService(wxString& error, int stopFd)
 {
+    // Started, the service is to convert: a marker left from a pause goes.
+    if (!ResumeService(error))
+        return false;
     if (ServiceIsRunning())
         return true;
-    if (SystemdKnowsTheUnit())
+    bool stopped = false;
+    if (SystemdKnowsTheUnit(stopFd, stopped))
     {
-        if (!StartThroughSystemd(error))
+        if (!StartThroughSystemd(error, stopFd))
             return false;
     }
+    else if (stopped) // told to leave before anything was started
+        return false;
     else
     {
         const std::string program = HotfolderProgram();
@@ -159,7 +187,8 @@ bool StartService(wxString& error)
             error = _("The service did not come up; 'hotfolder serve' in a terminal tells why.");
             return false;
         }
-        std::this_thread::sleep_for(std::chrono::milliseconds(50));
+        if (!PauseUnlessStopped(stopFd, 50))
+            return false;
     }
     return true;
 }

@@ -3,6 +3,8 @@
 #include <fcntl.h>
 #include <unistd.h>
 
+#include "posix/NativePath.h"
+
 PreviewWorker::PreviewWorker()
 {
     int ends[2];
@@ -28,9 +30,17 @@ PreviewWorker::~PreviewWorker()
 
 void PreviewWorker::Request(const wxString& postscript, const PreviewOptions& options, Done done)
 {
+    PreviewRequest request;
+    request.postscript = postscript;
+    request.options = options;
+    Request(std::move(request), std::move(done));
+}
+
+void PreviewWorker::Request(PreviewRequest request, Done done)
+{
     {
         std::lock_guard<std::mutex> lock(m_mutex);
-        m_pending.reset(new Job{postscript, options, std::move(done)});
+        m_pending.reset(new Job{std::move(request), std::move(done)});
         if (m_busy)
             SignalStop();
     }
@@ -65,16 +75,33 @@ void PreviewWorker::Run()
         DrainStop();
         m_busy = true;
         lock.unlock();
-        const PagePreview preview =
-            RenderPagePreview(job->postscript, job->options, m_stopRead.Get());
+        PagePreview preview;
+        const PreviewRequest& request = job->request;
+        if (!request.prepare || request.prepare(preview.reason))
+        {
+            lock.lock();
+            const bool stale = Superseded();
+            lock.unlock();
+            if (!stale)
+                preview = RenderPagePreview(request.postscript, request.options, m_stopRead.Get());
+        }
+        // Before done: whoever is told of the page finds no scratch file left.
+        job->RemoveScratch();
         lock.lock();
         m_busy = false;
         // Superseded or closing: the result is stale, and nobody gets it.
-        if (m_quit || m_pending)
+        if (Superseded())
             continue;
         lock.unlock();
         if (job->done)
             job->done(preview);
         lock.lock();
     }
+}
+
+void PreviewWorker::Job::RemoveScratch()
+{
+    if (request.removeAfter)
+        unlink(posix::NativePath(request.postscript).c_str());
+    request.removeAfter = false;
 }

@@ -32,7 +32,6 @@ PreviewPanel::PreviewPanel(wxWindow* parent, const wxString& modulePath)
 PreviewPanel::~PreviewPanel()
 {
     m_worker.reset();
-    RemoveTrialFile();
 }
 
 void PreviewPanel::SetFolder(const wxString& folder)
@@ -43,7 +42,9 @@ void PreviewPanel::SetFolder(const wxString& folder)
 
 void PreviewPanel::ShowOutput(const wxString& output, const wxString& title)
 {
-    Render(output, title);
+    PreviewRequest request;
+    request.postscript = output;
+    Render(std::move(request), title, _(L"Rendering…"));
 }
 
 void PreviewPanel::TryFile()
@@ -58,38 +59,44 @@ void PreviewPanel::TryFile()
 
 bool PreviewPanel::TryFileNamed(const wxString& eps)
 {
-    const wxString trial = wxFileName::CreateTempFileName("hf-trial");
-    wxString error;
-    if (trial.empty())
-        error = _("no scratch file can be made");
-    else if (ConvertForTrial(m_folder, eps, m_modulePath, trial, error))
+    const wxString title =
+        wxString::Format(_("Trial: %s"), posix::ShownLine(wxFileName(eps).GetFullName()));
+    const wxString cannot = _("Cannot convert: %s");
+    PreviewRequest request;
+    request.postscript = wxFileName::CreateTempFileName("hf-trial");
+    if (request.postscript.empty())
     {
-        Render(trial,
-               wxString::Format(_("Trial: %s"), posix::ShownLine(wxFileName(eps).GetFullName())));
-        RemoveTrialFile();
-        m_trialFile = trial;
-        return true;
+        ++m_generation; // a page still on its way is no longer wanted
+        m_title->SetLabel(title);
+        m_canvas->ShowMessage(wxString::Format(cannot, _("no scratch file can be made")));
+        return false;
     }
-    if (!trial.empty())
-        wxRemoveFile(trial);
-    ++m_generation;
-    m_title->SetLabel(
-        wxString::Format(_("Trial: %s"), posix::ShownLine(wxFileName(eps).GetFullName())));
-    m_canvas->ShowMessage(wxString::Format(_("Cannot convert: %s"), posix::ShownLine(error)));
-    return false;
+    request.removeAfter = true;
+    // The worker's thread gets strings of its own, never shared with this one.
+    request.prepare = [folder = m_folder.Clone(), eps = eps.Clone(), module = m_modulePath.Clone(),
+                       output = request.postscript.Clone(),
+                       cannot = cannot.Clone()](wxString& reason)
+    {
+        wxString error;
+        if (ConvertForTrial(folder, eps, module, output, error))
+            return true;
+        reason = wxString::Format(cannot, posix::ShownLine(error));
+        return false;
+    };
+    Render(std::move(request), title, _(L"Converting…"));
+    return true;
 }
 
-void PreviewPanel::Render(const wxString& postscript, const wxString& title)
+void PreviewPanel::Render(PreviewRequest request, const wxString& title, const wxString& message)
 {
     m_title->SetLabel(title);
-    m_canvas->ShowMessage(_(L"Rendering…"));
-    PreviewOptions options;
-    options.imageable = ImageableAreaOf(m_folder);
+    m_canvas->ShowMessage(message);
+    request.options.imageable = ImageableAreaOf(m_folder);
     wxString ghostscript;
     if (wxGetEnv("HOTFOLDER_GHOSTSCRIPT", &ghostscript) && !ghostscript.empty())
-        options.ghostscript = ghostscript;
+        request.options.ghostscript = ghostscript;
     const size_t generation = ++m_generation;
-    m_worker->Request(postscript, options,
+    m_worker->Request(std::move(request),
                       [this, generation](const PagePreview& preview)
                       {
                           // A copy of its own: the worker's image is not
@@ -105,11 +112,4 @@ void PreviewPanel::Render(const wxString& postscript, const wxString& title)
                                       m_canvas->ShowPage(page);
                               });
                       });
-}
-
-void PreviewPanel::RemoveTrialFile()
-{
-    if (!m_trialFile.empty())
-        wxRemoveFile(m_trialFile);
-    m_trialFile.clear();
 }

@@ -13,7 +13,7 @@ class wxStaticText;
 // Ghostscript on the preview worker's thread so that a slow or missing
 // Ghostscript never holds the window; and "Try a file…", which converts any
 // EPS with the folder's current settings into a scratch file (the folder is
-// not touched) and shows that.
+// not touched) on that thread too, and shows that.
 class PreviewPanel : public wxPanel
 {
 public:
@@ -26,8 +26,9 @@ public:
     void ShowOutput(const wxString& output, const wxString& title);
     // Asks for an EPS file and tries it.
     void TryFile();
-    // Tries eps with the folder's current settings; false (and the reason
-    // shown) when it cannot be converted.
+    // Tries eps with the folder's current settings: true once the trial is
+    // under way, its page or why it cannot be converted arriving later as a
+    // delivered page; false (the reason shown) when it cannot even begin.
     bool TryFileNamed(const wxString& eps);
 
     PreviewCanvas& Canvas() const { return *m_canvas; }
@@ -36,18 +37,16 @@ public:
     size_t Delivered() const { return m_delivered; }
 
 private:
-    void Render(const wxString& postscript, const wxString& title);
-    void RemoveTrialFile();
+    void Render(PreviewRequest request, const wxString& title, const wxString& message);
 
     wxString m_modulePath;
     wxString m_folder;
-    wxString m_trialFile;
     wxStaticText* m_title = nullptr;
     PreviewCanvas* m_canvas = nullptr;
     wxButton* m_try = nullptr;
     size_t m_generation = 0;
     size_t m_delivered = 0;
-    // Ended first (stopping Ghostscript and joining) before the files it
-    // reads are removed and the windows it reports to go.
+    // Ended first (stopping Ghostscript, joining, removing a trial's
+    // scratch file) before the windows it reports to go.
     std::unique_ptr<PreviewWorker> m_worker = std::make_unique<PreviewWorker>();
 };

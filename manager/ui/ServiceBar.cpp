@@ -5,6 +5,8 @@
 #include <wx/sizer.h>
 #include <wx/stattext.h>
 
+#include "ui/ServiceStarter.h"
+
 ServiceBar::ServiceBar(wxWindow* parent, std::function<void()> changed)
     : wxPanel(parent), m_changed(std::move(changed))
 {
@@ -19,8 +21,17 @@ ServiceBar::ServiceBar(wxWindow* parent, std::function<void()> changed)
     SetSizer(sizer);
 }
 
+// Ends a start under way (the service may still come up), quickly.
+ServiceBar::~ServiceBar() = default;
+
 void ServiceBar::ShowState(ServiceState state)
 {
+    // While starting, the bar keeps saying so; the state shows once it ends.
+    if (m_starter)
+    {
+        m_state = state;
+        return;
+    }
     if (m_shown && state == m_state)
         return;
     m_shown = true;
@@ -46,20 +57,37 @@ void ServiceBar::ShowState(ServiceState state)
 
 void ServiceBar::OnAction()
 {
-    wxString error;
-    bool done = false;
-    switch (m_state)
+    if (m_starter)
+        return;
+    if (m_state == ServiceState::Stopped)
     {
-    case ServiceState::Running:
-        done = PauseService(error);
-        break;
-    case ServiceState::Paused:
-        done = ResumeService(error);
-        break;
-    case ServiceState::Stopped:
-        done = StartService(error);
-        break;
+        Start();
+        return;
     }
+    wxString error;
+    const bool done = m_state == ServiceState::Running ? PauseService(error) : ResumeService(error);
+    Report(done, error);
+}
+
+void ServiceBar::Start()
+{
+    m_text->SetLabel(_(L"Starting the service…"));
+    m_button->Disable();
+    Layout();
+    m_starter = std::make_unique<ServiceStarter>(*this, [this](bool done, const wxString& error)
+                                                 { Started(done, error); });
+}
+
+void ServiceBar::Started(bool done, const wxString& error)
+{
+    m_starter.reset(); // joins a thread whose last act was to send this
+    m_shown = false;
+    ShowState(m_state);
+    Report(done, error);
+}
+
+void ServiceBar::Report(bool done, const wxString& error)
+{
     if (!done)
         wxMessageBox(error, _("Service"), wxOK | wxICON_ERROR, this);
     if (m_changed)

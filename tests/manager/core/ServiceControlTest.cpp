@@ -78,6 +78,8 @@ TEST_F(ServiceControl, StartPauseResumeAsTheServiceBarDoes)
             done = AsNobody(PauseService);
         else if (c[0] == "resume-as-nobody")
             done = AsNobody(ResumeService);
+        else if (c[0] == "start-as-nobody")
+            done = AsNobody([](wxString& error) { return StartService(error); });
         else
             FAIL() << "unknown action";
         EXPECT_EQ(done ? "yes" : "no", c[2]) << error;

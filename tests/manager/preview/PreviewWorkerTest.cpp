@@ -1,7 +1,10 @@
 // The worker: a newer request stops an older one's Ghostscript and the
-// older result is never handed out; closing stops Ghostscript at once.
+// older result is never handed out; closing stops Ghostscript at once; a
+// step before rendering runs on the worker, and a request's scratch file
+// goes with it.
 #include <atomic>
 #include <memory>
+#include <thread>
 
 #include "PreviewTestSupport.h"
 #include "preview/PreviewWorker.h"
@@ -66,5 +69,39 @@ TEST(PreviewWorker, ClosingStopsAHangingGhostscript)
         closer.join();
     }
     EXPECT_EQ(calls.slow, 0);
+}
+TEST(PreviewWorker, ANewerRequestDropsTheOneStillPreparingAndItsScratchFile)
+{
+    testkit::ScratchDir scratch("hf-preview-worker");
+    const std::string made = scratch.File("made.ps"), missing = scratch.File("missing.ps");
+    std::atomic<bool> preparing{false}, go{false}, onWorker{false};
+    const std::thread::id window = std::this_thread::get_id();
+    PreviewRequest first;
+    first.postscript = made;
+    first.removeAfter = true;
+    first.prepare = [&](wxString&)
+    {
+        onWorker = std::this_thread::get_id() != window;
+        preparing = true;
+        testkit::WaitFor([&] { return go.load(); }, 20000);
+        return testkit::WriteFile(made, "%!PS\nshowpage\n");
+    };
+    Calls calls;
+    wxString reason;
+    PreviewWorker worker;
+    worker.Request(std::move(first), [&](const PagePreview&) { ++calls.slow; });
+    ASSERT_TRUE(testkit::WaitFor([&] { return preparing.load(); }, 20000));
+    EXPECT_TRUE(onWorker);
+    worker.Request(missing, PreviewOptions(),
+                   [&](const PagePreview& preview)
+                   {
+                       reason = preview.reason.Clone();
+                       ++calls.quick;
+                   });
+    go = true;
+    ASSERT_TRUE(testkit::WaitFor([&] { return calls.quick > 0; }, 40000));
+    EXPECT_NE(wxString::npos, reason.find("cannot find the file")) << reason;
+    EXPECT_EQ(calls.slow, 0);
+    EXPECT_FALSE(testkit::Exists(made)) << "the dropped request's scratch file is left";
 }
 } // namespace
