@@ -40,19 +40,6 @@ public:
     bool OnInit() override { return true; }
 };
 
-struct Service
-{
-    pid_t pid = -1;
-    ~Service()
-    {
-        if (pid > 0)
-        {
-            kill(pid, SIGTERM);
-            testkit::WaitProgram(pid);
-        }
-    }
-};
-
 long ResidentKilobytes()
 {
     const std::string status = testkit::ReadFile("/proc/self/status");
@@ -197,7 +184,7 @@ int main(int argc, char** argv)
     hotFolder.Open(first, error);
     const std::string outputFolder(hotFolder.GetDefaultOutputFolder().utf8_str());
     const std::string log = scratch.File("serve-err.txt");
-    Service service;
+    testkit::BackgroundProgram service;
     service.pid = testkit::StartProgram({HF_HOTFOLDER_EXE, "serve"}, "", log);
     PumpUntil([] { return ReadServiceState() == ServiceState::Running; }, 10000);
     const std::string eps = testkit::ReadFile(HF_EXAMPLE_EPS);

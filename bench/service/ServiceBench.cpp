@@ -38,21 +38,6 @@ namespace
 {
 using Clock = std::chrono::steady_clock;
 
-// The service started by the benchmark; stopped also when the benchmark
-// gives up half-way.
-struct Service
-{
-    pid_t pid = -1;
-    ~Service()
-    {
-        if (pid > 0)
-        {
-            kill(pid, SIGTERM);
-            testkit::WaitProgram(pid);
-        }
-    }
-};
-
 long ResidentKilobytes(pid_t pid)
 {
     std::string status = testkit::ReadFile("/proc/" + std::to_string(pid) + "/status");
@@ -125,7 +110,7 @@ int main(int argc, char** argv)
     }
     const std::string log = scratch.File("serve-err.txt");
     const std::string statsOut = scratch.File("serve-out.txt");
-    Service service;
+    testkit::BackgroundProgram service;
     service.pid = testkit::StartProgram({host, "serve", "--stats"}, statsOut, log);
     const auto waitServing = [&]
     {
@@ -285,7 +270,7 @@ int BenchPreflight(const testkit::ScratchDir& scratch, const std::string& host,
     }
     testkit::RunProgram({host, "settings", folders[1], "--preflight", "on"});
     const std::string log = scratch.File("preflight-err.txt");
-    Service service;
+    testkit::BackgroundProgram service;
     service.pid = testkit::StartProgram({host, "serve"}, "", log);
     const bool serving = testkit::WaitFor(
         [&]
@@ -360,7 +345,7 @@ int BenchPrinting(const testkit::ScratchDir& scratch, const std::string& host,
     testkit::RunProgram(
         {host, "settings", folder, "--set", "OUTPUTFILETYPEEPS=0", "OUTPUTFILETYPEPS=1"});
     const std::string log = scratch.File("print-err.txt");
-    Service service;
+    testkit::BackgroundProgram service;
     service.pid = testkit::StartProgram({host, "serve"}, "", log);
     if (!testkit::WaitFor(
             [&] { return testkit::ReadFile(log).find("<6>serving ") != std::string::npos; }, 10000))

@@ -10,6 +10,7 @@
 #include <grp.h>
 #include <spawn.h>
 #include <sys/stat.h>
+#include <signal.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -177,6 +178,25 @@ inline int WaitProgram(pid_t pid)
             return -1;
     return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
 }
+
+// A program started in the background (pid from StartProgram), ended with
+// SIGTERM and waited for when the object goes, also when its owner gives up
+// half-way; a pid set back to -1 is left alone.
+struct BackgroundProgram
+{
+    pid_t pid = -1;
+    BackgroundProgram() = default;
+    BackgroundProgram(const BackgroundProgram&) = delete;
+    BackgroundProgram& operator=(const BackgroundProgram&) = delete;
+    ~BackgroundProgram()
+    {
+        if (pid > 0)
+        {
+            kill(pid, SIGTERM);
+            WaitProgram(pid);
+        }
+    }
+};
 
 struct ProcessResult
 {

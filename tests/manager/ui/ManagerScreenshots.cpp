@@ -1,10 +1,8 @@
 // Renders the manager's window (two folders of a scratch warehouse, one
 // printing on a queue of a scheduler of its own with the service running,
-// one output only, and a printed job's page) and its folder dialog to PNG files for the
-// documentation (scripts/screenshots.sh). Usage: manager_screenshots <dir> <en|de>
-#include <signal.h>
-#include <sys/stat.h>
-
+// one output only, and a printed job's page) and its folder dialog to PNG
+// files for the documentation (scripts/screenshots.sh).
+// Usage: manager_screenshots <dir> <en|de>
 #include <clocale>
 #include <cstdio>
 #include <memory>
@@ -48,15 +46,7 @@ bool Host(const std::vector<std::string>& args)
 struct Machine
 {
     std::unique_ptr<cups_test::PrivateCupsd> cups;
-    pid_t service = -1;
-    ~Machine()
-    {
-        if (service > 0)
-        {
-            kill(service, SIGTERM);
-            testkit::WaitProgram(service);
-        }
-    }
+    testkit::BackgroundProgram service; // ended before the scheduler
 };
 
 bool StartMachine(Machine& machine)
@@ -70,9 +60,9 @@ bool StartMachine(Machine& machine)
         std::fprintf(stderr, "manager_screenshots: %s\n", problem.c_str());
         return false;
     }
-    machine.service = testkit::StartProgram({HF_HOTFOLDER_EXE, "serve"}, "/dev/null",
-                                            Scratch().File("serve.txt"));
-    return machine.service > 0;
+    machine.service.pid = testkit::StartProgram({HF_HOTFOLDER_EXE, "serve"}, "/dev/null",
+                                                Scratch().File("serve.txt"));
+    return machine.service.pid > 0;
 }
 
 // Two folders, the first printing on the scheduler's queue, the second
